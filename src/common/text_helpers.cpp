@@ -1,0 +1,128 @@
+#include "common/text_helpers.h"
+
+#include "common/decimal_digits.h"
+
+#include <QDateTime>
+
+namespace ardcard {
+
+QString StripQuotes(const QVariant& value) {
+    if (value.isNull())
+        return {};
+    const QString text = value.toString();
+    QString out;
+    out.reserve(text.size());
+    for (const QChar c : text) {
+        if (c != u'"' && c != u'\'' && c != u',')
+            out += c;
+    }
+    return out;
+}
+
+int SplitCompanyDirs(const QString& text, QStringList& list) {
+    QStringList entries{QString()};
+    QString token;
+    for (const QChar c : text) {
+        if (c != u';' && c != u',') {
+            token += c;
+        } else if (!token.isEmpty()) {
+            entries.append(token);
+            token.clear();
+        }
+    }
+    if (!token.isEmpty())
+        entries.append(token);
+    const int count = static_cast<int>(entries.size()) - 1;
+    if (count > 0)
+        list = std::move(entries);
+    return count;
+}
+
+QString NullToText(const QVariant& value, const QString& fallback) {
+    return value.isNull() ? fallback : PlainText(value);
+}
+
+double NullToZero(const QVariant& value) {
+    if (value.isNull())
+        return 0.0;
+    bool ok = false;
+    const double d = value.toDouble(&ok);
+    return ok ? d : 0.0;
+}
+
+QString NullToNbsp(const QVariant& value) {
+    return value.isNull() ? QStringLiteral("&nbsp;") : PlainText(value);
+}
+
+QString PlainNumber(double value) {
+    const detail::DecimalDigits d = detail::toDecimalDigits(value);
+    std::string digits = d.digits;
+    const size_t last = digits.find_last_not_of('0');
+    if (last == std::string::npos)
+        return QStringLiteral("0");
+    digits.resize(last + 1);
+
+    std::string out;
+    if (d.negative)
+        out += '-';
+    const int e = d.exponent;
+    const int len = static_cast<int>(digits.size());
+    if (e < 0) {
+        out += "0.";
+        out.append(static_cast<size_t>(-e - 1), '0');
+        out += digits;
+    } else if (e >= len - 1) {
+        out += digits;
+        out.append(static_cast<size_t>(e - (len - 1)), '0');
+    } else {
+        out.append(digits, 0, static_cast<size_t>(e + 1));
+        out += '.';
+        out.append(digits, static_cast<size_t>(e + 1), std::string::npos);
+    }
+    return QString::fromLatin1(out.data(), static_cast<qsizetype>(out.size()));
+}
+
+QString PlainText(const QVariant& value) {
+    if (value.isNull())
+        return {};
+    switch (value.typeId()) {
+    case QMetaType::Double:
+    case QMetaType::Float:
+        return PlainNumber(value.toDouble());
+    case QMetaType::QDate:
+        return value.toDate().toString(Qt::ISODate);
+    case QMetaType::QDateTime: {
+        const QDateTime dt = value.toDateTime();
+        return dt.time() == QTime(0, 0) ? dt.date().toString(Qt::ISODate)
+                                        : dt.toString(QStringLiteral("yyyy-MM-dd HH:mm:ss"));
+    }
+    case QMetaType::Bool:
+        return value.toBool() ? QStringLiteral("1") : QStringLiteral("0");
+    default:
+        return value.toString();
+    }
+}
+
+QDate ToDate(const QVariant& value) {
+    if (value.isNull())
+        return {};
+    switch (value.typeId()) {
+    case QMetaType::QDate:
+        return value.toDate();
+    case QMetaType::QDateTime:
+        return value.toDateTime().date();
+    case QMetaType::QString: {
+        const QString text = value.toString().trimmed();
+        if (text.size() < 10)
+            return {};
+        const QDate date = QDate::fromString(text.left(10), Qt::ISODate);
+        if (!date.isValid() || (text.size() > 10 && text[10] != u' ' && text[10] != u'T'))
+            return {};
+        return date;
+    }
+    default:
+        return {};
+    }
+}
+
+} // namespace ardcard
