@@ -52,8 +52,8 @@ void TestCommon::stripQuotes_data() {
     QTest::addColumn<QVariant>("value");
     QTest::addColumn<QString>("expected");
     QTest::newRow("plain") << QVariant(QStringLiteral("1001")) << QStringLiteral("1001");
-    QTest::newRow("quotes and commas") << QVariant(QStringLiteral("12'3,\"4\""))
-                                       << QStringLiteral("1234");
+    QTest::newRow("quotes and commas")
+        << QVariant(QStringLiteral("12'3,\"4\"")) << QStringLiteral("1234");
     QTest::newRow("only quotes") << QVariant(QStringLiteral("'\",,'")) << QString();
     QTest::newRow("null") << QVariant() << QString();
     QTest::newRow("empty") << QVariant(QString()) << QString();
@@ -76,8 +76,8 @@ void TestCommon::splitCompanyDirs_data() {
     QTest::newRow("separators at ends and doubled")
         << QStringLiteral(";;a;,b,;") << QStringList{QStringLiteral("a"), QStringLiteral("b")};
     QTest::newRow("one") << QStringLiteral("demo.db") << QStringList{QStringLiteral("demo.db")};
-    QTest::newRow("spaces are kept") << QStringLiteral(" a ; b")
-                                     << QStringList{QStringLiteral(" a "), QStringLiteral(" b")};
+    QTest::newRow("spaces are kept")
+        << QStringLiteral(" a ; b") << QStringList{QStringLiteral(" a "), QStringLiteral(" b")};
 }
 
 void TestCommon::splitCompanyDirs() {
@@ -134,8 +134,8 @@ void TestCommon::plainNumber_data() {
     QTest::newRow("sum noise trimmed at 15 digits") << (0.1 + 0.2) << QStringLiteral("0.3");
     QTest::newRow("large, no exponent") << 1e15 << QStringLiteral("1000000000000000");
     QTest::newRow("small, no exponent") << 0.00012 << QStringLiteral("0.00012");
-    QTest::newRow("15 significant digits") << 123456789.123456789
-                                           << QStringLiteral("123456789.123457");
+    QTest::newRow("15 significant digits")
+        << 123456789.123456789 << QStringLiteral("123456789.123457");
 }
 
 void TestCommon::plainNumber() {
@@ -204,10 +204,9 @@ void TestCommon::toDate_data() {
     QTest::newRow("date time") << QVariant(QDateTime(QDate(2020, 2, 29), QTime(10, 0)))
                                << QDate(2020, 2, 29);
     QTest::newRow("iso text") << QVariant(QStringLiteral("2020-02-29")) << QDate(2020, 2, 29);
-    QTest::newRow("iso text with time") << QVariant(QStringLiteral("2020-02-29 00:00:00"))
-                                        << QDate(2020, 2, 29);
-    QTest::newRow("iso T") << QVariant(QStringLiteral("2020-02-29T12:30:00"))
-                           << QDate(2020, 2, 29);
+    QTest::newRow("iso text with time")
+        << QVariant(QStringLiteral("2020-02-29 00:00:00")) << QDate(2020, 2, 29);
+    QTest::newRow("iso T") << QVariant(QStringLiteral("2020-02-29T12:30:00")) << QDate(2020, 2, 29);
     QTest::newRow("null") << QVariant() << QDate();
     QTest::newRow("not a date") << QVariant(QStringLiteral("2020-02-30")) << QDate();
     QTest::newRow("free text") << QVariant(QStringLiteral("yesterday morning")) << QDate();
@@ -291,8 +290,7 @@ void TestCommon::writerUnmappable_data() {
     QTest::addColumn<QByteArray>("expected");
     QTest::newRow("page") << int(TextFileWriter::Unmappable::CharacterReference)
                           << QByteArray("a&#128512;b&#1589;\r\n");
-    QTest::newRow("csv") << int(TextFileWriter::Unmappable::QuestionMark)
-                         << QByteArray("a?b?\r\n");
+    QTest::newRow("csv") << int(TextFileWriter::Unmappable::QuestionMark) << QByteArray("a?b?\r\n");
 }
 
 void TestCommon::writerUnmappable() {

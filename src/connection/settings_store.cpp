@@ -2,22 +2,15 @@
 
 #include "common/failure.h"
 #include "common/module_state.h"
+#include "connection/ini_file.h"
 #include "connection/settings_keys.h"
 
-#include <QFile>
-#include <QSettings>
+#include <QStandardPaths>
 #include <cmath>
 
 namespace ardcard {
 
 namespace {
-
-QString storedText(const QVariant& v) {
-    // A hand-written "a,b" reads back from INI as a list; it is one text.
-    if (v.typeId() == QMetaType::QStringList)
-        return v.toStringList().join(u',');
-    return v.toString();
-}
 
 // A number in the settings' text, rounded to the nearest whole number
 // (halves to even); false when the text is not a number.
@@ -32,30 +25,19 @@ bool storedNumber(const QString& text, int* out) {
 
 } // namespace
 
+QString SettingsFilePath(const QString& app) {
+    return QStandardPaths::writableLocation(QStandardPaths::GenericConfigLocation) + u'/' + app +
+           QStringLiteral(".ini");
+}
+
 QString ReadSetting(const QString& app, const QString& section, const QString& key,
                     const QString& fallback) {
-    QSettings settings(QSettings::IniFormat, QSettings::UserScope, app);
-    settings.sync(); // see edits made by other programs since the last read
-    if (settings.status() != QSettings::NoError)
-        return fallback;
-    settings.beginGroup(section);
-    const QVariant v = settings.value(key);
-    if (!v.isValid())
-        return fallback;
-    return storedText(v);
+    return IniFile(SettingsFilePath(app)).read(section, key).value_or(fallback);
 }
 
 void SaveSetting(const QString& app, const QString& section, const QString& key,
                  const QString& value) {
-    QSettings settings(QSettings::IniFormat, QSettings::UserScope, app);
-    settings.beginGroup(section);
-    settings.setValue(key, value);
-    settings.endGroup();
-    settings.sync();
-    const QString file = settings.fileName();
-    if (settings.status() != QSettings::NoError)
-        throw Failure(QStringLiteral("לא ניתן לשמור את ההגדרות בקובץ %1").arg(file));
-    QFile::setPermissions(file, QFile::ReadOwner | QFile::WriteOwner);
+    IniFile(SettingsFilePath(app)).write(section, key, value);
 }
 
 void ReadConnParams() {

@@ -6,15 +6,17 @@
 
 namespace ardcard {
 
-// The per-user settings store: QSettings in INI form, one file per
-// application name ($XDG_CONFIG_HOME/<app>.ini), one group per section,
-// values as text. The file holds the password, so it is kept readable and
-// writable by its owner only.
+// The per-user settings store: one INI file per application name
+// ($XDG_CONFIG_HOME/<app>.ini, see ini_file.h), one section per settings
+// section, values as text. The file holds the password, so it is kept
+// readable and writable by its owner only.
 //
 // Every key with its default lives in settings_keys.h.
 
 inline const QString kRegApp = QStringLiteral("VL7Trans");
 inline const QString kRegSection = QStringLiteral("Params");
+
+QString SettingsFilePath(const QString& app);
 
 // The stored text, or `fallback` when the key is missing or the store cannot
 // be read. Never fails.
