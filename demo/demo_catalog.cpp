@@ -122,26 +122,28 @@ void writeItemExtraFields(CompanyWriter& writer) {
                                QStringLiteral("להרחיק מאור שמש")};
     for (const Product& p : kProducts) {
         const QString key = p.key.toString();
-        if (random.chance(60))
+        // The first item has every kind of field, so that its page shows them all.
+        const bool all = &p == &kProducts[0];
+        if (all || random.chance(60))
             writer.insert(QStringLiteral("ExtraNotes"),
                           {{QStringLiteral("KeF"), key},
                            {QStringLiteral("NoteID"), 2},
                            {QStringLiteral("ItemFlag"), 1},
                            {QStringLiteral("Note"), storage[random.below(3)]}});
-        if (random.chance(50))
+        if (all || random.chance(50))
             writer.insert(QStringLiteral("ExtraSums"),
                           {{QStringLiteral("KeF"), key},
                            {QStringLiteral("SuFID"), 1},
                            {QStringLiteral("ItemFlag"), 1},
                            {QStringLiteral("SuF"), random.between(1, 20) * 12}});
-        writer.insert(
-            QStringLiteral("ExtraDates"),
-            {{QStringLiteral("KeF"), key},
-             {QStringLiteral("DatFID"), random.chance(70) ? 1 : 2},
-             {QStringLiteral("ItemFlag"), 1},
-             {QStringLiteral("DatF"),
-              random.chance(80) ? QVariant(IsoDate(QDate(2015, 1, 1).addDays(random.below(3000))))
-                                : QVariant()}});
+        writer.insert(QStringLiteral("ExtraDates"),
+                      {{QStringLiteral("KeF"), key},
+                       {QStringLiteral("DatFID"), random.chance(70) ? 1 : 2},
+                       {QStringLiteral("ItemFlag"), 1},
+                       {QStringLiteral("DatF"),
+                        all || random.chance(80)
+                            ? QVariant(IsoDate(QDate(2015, 1, 1).addDays(random.below(3000))))
+                            : QVariant()}});
     }
 }
 
