@@ -107,6 +107,23 @@ void CompanyWriter::insert(const QString& table, const Columns& columns) {
         values);
 }
 
+void CompanyWriter::insertRows(const QString& table, const QStringList& columns,
+                               const QVariantList& values) {
+    constexpr qsizetype kRowsPerStatement = 100;
+    const qsizetype width = columns.size();
+    if (width == 0 || values.size() % width != 0)
+        throw Failure(QStringLiteral("מספר הערכים אינו מתחלק במספר העמודות של %1").arg(table));
+    const QString head = QStringLiteral("INSERT INTO %1 (%2) VALUES ")
+                             .arg(table, columns.join(QStringLiteral(", ")));
+    QStringList marks(width, QStringLiteral("?"));
+    const QString row = u'(' + marks.join(QStringLiteral(", ")) + u')';
+    for (qsizetype first = 0; first < values.size(); first += width * kRowsPerStatement) {
+        const qsizetype count = std::min(values.size() - first, width * kRowsPerStatement);
+        QStringList rows(count / width, row);
+        execPrepared(head + rows.join(QStringLiteral(", ")), values.mid(first, count));
+    }
+}
+
 void CompanyWriter::execPrepared(const QString& sql, const QVariantList& values) {
     begin();
     auto it = prepared_.find(sql);

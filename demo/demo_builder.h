@@ -25,7 +25,8 @@ QString DemoAccountKey();
 // A company file with the account `accountKey`, four counter accounts and
 // exactly `lineCount` journal lines of that account that the journal read
 // takes (each with its counter line), dated 2019 to 2025. Built in one
-// transaction; a million lines take seconds. Throws Failure.
+// transaction; a million lines take some ten seconds of processor time.
+// Throws Failure.
 void BuildLedgerCompany(const QString& path, const QString& accountKey, int lineCount);
 
 } // namespace ardcard::demo
