@@ -258,7 +258,7 @@ void writeTrees(CompanyWriter& writer) {
         writer.insert(QStringLiteral("TreeTypes"),
                       {{QStringLiteral("TreeType"), type},
                        {QStringLiteral("TreeTypeName"), name.toString()}});
-    struct Part {
+    struct Component {
         QStringView parent;
         QStringView component;
         int type;
@@ -266,7 +266,7 @@ void writeTrees(CompanyWriter& writer) {
         int quantityE3;
         int sonQuantE3;
     };
-    const Part parts[] = {
+    const Component components[] = {
         {u"SAL-01", u"P1001", 2, 1, 1000, 1000},    {u"SAL-01", u"P1014", 2, 1, 1000, 2000},
         {u"SAL-01", u"P1017", 2, 1, 1000, 1000},    {u"SAL-01", u"P1030", 3, 1, 1000, 1000},
         {u"SAL-01", u"P1031", 3, 1, 1000, 1500},    {u"SAL-02", u"P1009", 2, 1, 1000, 1000},
@@ -277,7 +277,7 @@ void writeTrees(CompanyWriter& writer) {
         {u"Exp-100", u"P1015", 1, 1, 12000, 12000}, {u"Exp-100", u"P1024", 1, 1, 12000, 6000},
         {u"Exp-100", u"P1032", 3, 1, 12000, 12250}};
     int id = 0;
-    for (const Part& p : parts)
+    for (const Component& p : components)
         writer.insert(QStringLiteral("Trees"),
                       {{QStringLiteral("ID"), ++id},
                        {QStringLiteral("TreeType"), p.type},
