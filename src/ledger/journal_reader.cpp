@@ -16,12 +16,15 @@ namespace ardcard {
 
 namespace {
 
-// Rows reach the grid (and an attached view) in batches of this many: one
-// insertion per batch instead of one per journal line.
-constexpr qsizetype kCommitBatch = 4096;
+// Rows reach the grid (and an attached view) in batches: one insertion per
+// batch instead of one per journal line. A long read uses fewer, larger
+// batches, since each insertion costs an attached view work in proportion to
+// the rows it already shows.
+constexpr qsizetype kMinCommitBatch = 4096;
+constexpr qsizetype kCommitsPerRead = 32;
 
-// Texts that repeat from line to line (currency and costing codes, counter
-// accounts, recurring details) share one string, so a long ledger does not
+// Short texts that repeat from line to line (currency and costing codes,
+// counter accounts) share one string, so a long ledger does not
 // keep a copy per row. The pool stops growing at `limit` distinct values.
 class StringPool {
 public:
@@ -182,10 +185,11 @@ int read(const QString& compPath, const QString& accountKey, int compId,
     const int frameWidth = progress.frameWidth();
     if (!options.onlyGraph)
         ledger.reserve(static_cast<qsizetype>(recCount));
+    const qsizetype commitBatch =
+        std::max(kMinCommitBatch, static_cast<qsizetype>(recCount) / kCommitsPerRead);
 
     StringPool codes(256);
     StringPool counters(4096);
-    StringPool details(4096);
     const QString space = QStringLiteral(" ");
     const QString dash = QStringLiteral("-");
 
@@ -233,7 +237,7 @@ int read(const QString& compPath, const QString& accountKey, int compId,
                 row.dueDate = dueDate;
                 row.referance = line.numberOrZero(c.referance, u"Referance");
                 row.ref2 = line.numberOrZero(c.ref2, u"Ref2");
-                row.description = details.intern(NullToText(line.value(c.description), space));
+                row.description = NullToText(line.value(c.description), space);
                 row.amount = amount;
                 row.foreignAmount = foreignAmount;
                 const QVariant code = line.value(c.currencyCode);
@@ -246,14 +250,16 @@ int read(const QString& compPath, const QString& accountKey, int compId,
                     throw Failure(line.where() + QStringLiteral("מזהה המטבע %1 אינו בתחום 1 עד %2")
                                                      .arg(row.currencyId)
                                                      .arg(kCurrencyCount));
-                state.CurrencyCodes[static_cast<size_t>(row.currencyId)] =
-                    code.isNull() ? dash : row.currencyCode;
+                QString& seenCode = state.CurrencyCodes[static_cast<size_t>(row.currencyId)];
+                const QString& newCode = code.isNull() ? dash : row.currencyCode;
+                if (seenCode != newCode)
+                    seenCode = newCode;
                 row.detail.CompIndex = compId;
                 row.detail.CounterKey = counters.intern(NullToText(counterKey, QString()));
                 row.detail.CounterName = counterName;
                 state.CurrencyTotals[static_cast<size_t>(row.currencyId)] += foreignAmount;
                 ledger.stage(std::move(row));
-                if (ledger.stagedCount() >= kCommitBatch)
+                if (ledger.stagedCount() >= commitBatch)
                     ledger.commitStaged();
             }
 
