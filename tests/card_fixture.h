@@ -1,14 +1,14 @@
 #pragma once
 
-// Company database files for the card and dialog tests, written with plain
-// SQLite SQL: the tables and columns the card reads, nothing more.
+// Company files for the card and dialog tests: the host product's schema
+// from the fixture writer, filled with a few rows each test names.
+
+#include "common/failure.h"
+#include "demo/company_writer.h"
 
 #include <QDir>
 #include <QFile>
 #include <QSettings>
-#include <QSqlDatabase>
-#include <QSqlError>
-#include <QSqlQuery>
 #include <QString>
 #include <QStringList>
 #include <QTemporaryDir>
@@ -16,38 +16,39 @@
 
 namespace fixture {
 
-inline const QString kAccountsTable = QStringLiteral(
-    "CREATE TABLE Accounts (ID INTEGER PRIMARY KEY, AccountKey TEXT COLLATE NOCASE,"
-    " FullName TEXT, Phone TEXT, Address TEXT, Details TEXT, Filter TEXT COLLATE NOCASE,"
-    " Balance DOUBLE PRECISION, Obligo DOUBLE PRECISION, Delivery DOUBLE PRECISION,"
-    " City TEXT, Zip TEXT, Country TEXT, Agent INTEGER, Dumi INTEGER DEFAULT 0)");
+// One Accounts row from the values of the columns the card reads, in this
+// order: ID, AccountKey, FullName, Phone, Address, Details, Filter, Balance,
+// Obligo, Delivery, City, Zip, Country, Agent, Dumi.
+inline QString accountRow(const QString& values) {
+    return QStringLiteral("INSERT INTO Accounts (ID, AccountKey, FullName, Phone, Address,"
+                          " Details, Filter, Balance, Obligo, Delivery, City, Zip, Country,"
+                          " Agent, Dumi) VALUES (") +
+           values + u')';
+}
 
-inline const QString kCompanyTable =
-    QStringLiteral("CREATE TABLE CompanyDefenitions (ID INTEGER PRIMARY KEY, CompanyName TEXT,"
-                   " ShortName TEXT, VatNum TEXT, DeductNum TEXT,"
-                   " HiddenAccountsFilter TEXT COLLATE NOCASE)");
+// The company definitions row: ID, CompanyName, ShortName, VatNum, DeductNum,
+// HiddenAccountsFilter.
+inline QString companyRow(const QString& values) {
+    return QStringLiteral("INSERT INTO CompanyDefenitions (ID, CompanyName, ShortName, VatNum,"
+                          " DeductNum, HiddenAccountsFilter) VALUES (") +
+           values + u')';
+}
 
-// Creates (or replaces) dir/file and runs the statements in it.
+// Creates (or replaces) the company file dir/file with the host product's
+// schema and runs the statements in it.
 inline bool createDatabase(const QString& dir, const QString& file, const QStringList& sql) {
     const QString path = QDir(dir).filePath(file);
-    QFile::remove(path);
-    const QString name = QStringLiteral("fixture-") + file;
-    bool ok = true;
-    {
-        QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), name);
-        db.setDatabaseName(path);
-        ok = db.open();
-        QSqlQuery query(db);
-        for (const QString& statement : sql) {
-            if (!query.exec(statement)) {
-                qWarning("%s: %s", qPrintable(statement), qPrintable(query.lastError().text()));
-                ok = false;
-            }
-        }
-        db.close();
+    try {
+        ardcard::demo::CreateCompanyFile(path);
+        ardcard::demo::CompanyWriter writer(path);
+        for (const QString& statement : sql)
+            writer.exec(statement);
+        writer.commit();
+    } catch (const ardcard::Failure& failure) {
+        qWarning("%s: %s", qPrintable(file), qPrintable(failure.description()));
+        return false;
     }
-    QSqlDatabase::removeDatabase(name);
-    return ok;
+    return true;
 }
 
 // Points XDG_CONFIG_HOME, TMPDIR and Temp at `dir` before anything reads

@@ -197,41 +197,41 @@ void TestCard::initTestCase() {
     const QString d = dir_.path();
     QVERIFY(fixture::createDatabase(
         d, QStringLiteral("co1.db"),
-        {fixture::kAccountsTable, fixture::kCompanyTable,
-         QStringLiteral("INSERT INTO CompanyDefenitions VALUES (1, 'חברת הדגמה בע\"מ', 'הדגמה',"
-                        " '512345678', '940001234', 'secret')"),
-         QStringLiteral("INSERT INTO Accounts VALUES (1, '1001', 'אבי כהן', '03-1111111',"
-                        " 'הרצל 1', 'לקוח ותיק', '', 1234.5, 5000, 0, 'תל אביב', '61000',"
-                        " 'מרכז', 7, 0)"),
-         QStringLiteral("INSERT INTO Accounts VALUES (2, '1002', 'O''Brien Ltd', '04-2222222',"
-                        " 'דרך הים 5', 'ספק', NULL, -250.75, 0, 1500, 'חיפה', '31000', 'צפון',"
-                        " 3, 0)"),
-         QStringLiteral("INSERT INTO Accounts VALUES (3, '9999', 'שורת דמה כהן', '03-9999999',"
-                        " 'דמה', 'דמה', '', 0, 0, 0, '', '', '', 0, 1)"),
-         QStringLiteral("INSERT INTO Accounts VALUES (4, '1004', 'חשבון סודי', '02-4444444',"
-                        " 'סוד 4', 'מנהלים', 'SECRET', 99, 0, 0, 'ירושלים', '91000', '', 1, 0)"),
-         QStringLiteral("INSERT INTO Accounts VALUES (5, '1005', 'דני כהן', NULL, NULL, NULL,"
-                        " NULL, NULL, NULL, NULL, NULL, NULL, NULL, NULL, 0)"),
-         QStringLiteral("INSERT INTO Accounts VALUES (6, '9998', 'דמה אחרונה', '', '', '', '',"
-                        " 0, 0, 0, '', '', '', 0, 1)")}));
+        {fixture::companyRow(QStringLiteral("1, 'חברת הדגמה בע\"מ', 'הדגמה',"
+                                            " '512345678', '940001234', 'secret'")),
+         fixture::accountRow(
+             QStringLiteral("1, '1001', 'אבי כהן', '03-1111111',"
+                            " 'הרצל 1', 'לקוח ותיק', '', 1234.5, 5000, 0, 'תל אביב', '61000',"
+                            " 'מרכז', 7, 0")),
+         fixture::accountRow(
+             QStringLiteral("2, '1002', 'O''Brien Ltd', '04-2222222',"
+                            " 'דרך הים 5', 'ספק', NULL, -250.75, 0, 1500, 'חיפה', '31000', 'צפון',"
+                            " 3, 0")),
+         fixture::accountRow(QStringLiteral("3, '9999', 'שורת דמה כהן', '03-9999999',"
+                                            " 'דמה', 'דמה', '', 0, 0, 0, '', '', '', 0, 1")),
+         fixture::accountRow(QStringLiteral(
+             "4, '1004', 'חשבון סודי', '02-4444444',"
+             " 'סוד 4', 'מנהלים', 'SECRET', 99, 0, 0, 'ירושלים', '91000', '', 1, 0")),
+         fixture::accountRow(QStringLiteral("5, '1005', 'דני כהן', NULL, NULL, NULL,"
+                                            " NULL, NULL, NULL, NULL, NULL, NULL, NULL, NULL, 0")),
+         fixture::accountRow(QStringLiteral("6, '9998', 'דמה אחרונה', '', '', '', '',"
+                                            " 0, 0, 0, '', '', '', 0, 1"))}));
     QVERIFY(fixture::createDatabase(
         d, QStringLiteral("co2.db"),
-        {fixture::kAccountsTable, fixture::kCompanyTable,
-         QStringLiteral("INSERT INTO CompanyDefenitions VALUES (1, 'חברה שניה', 'שניה', '',"
-                        " NULL, '')"),
-         QStringLiteral("INSERT INTO Accounts VALUES (1, '2001', 'לקוח שני', '', '', '', '',"
-                        " 10, 0, 0, '', '', '', 0, 0)")}));
+        {fixture::companyRow(QStringLiteral("1, 'חברה שניה', 'שניה', '',"
+                                            " NULL, ''")),
+         fixture::accountRow(QStringLiteral("1, '2001', 'לקוח שני', '', '', '', '',"
+                                            " 10, 0, 0, '', '', '', 0, 0"))}));
     QVERIFY(fixture::createDatabase(
         d, QStringLiteral("co3.db"),
-        {fixture::kCompanyTable,
-         QStringLiteral("INSERT INTO CompanyDefenitions VALUES (2, 'שורה 2', 'שתיים', '1', '2',"
-                        " 'x')")}));
+        {fixture::companyRow(QStringLiteral("2, 'שורה 2', 'שתיים', '1', '2',"
+                                            " 'x'"))}));
     QVERIFY(fixture::createDatabase(
         d, QStringLiteral("dumionly.db"),
-        {fixture::kAccountsTable,
-         QStringLiteral("INSERT INTO Accounts VALUES (1, '1', 'דמה', '', '', '', '', 0, 0, 0,"
-                        " '', '', '', 0, 1)")}));
-    QVERIFY(fixture::createDatabase(d, QStringLiteral("noaccounts.db"), {fixture::kCompanyTable}));
+        {fixture::accountRow(QStringLiteral("1, '1', 'דמה', '', '', '', '', 0, 0, 0,"
+                                            " '', '', '', 0, 1"))}));
+    QVERIFY(fixture::createDatabase(d, QStringLiteral("noaccounts.db"),
+                                    {QStringLiteral("DROP TABLE Accounts")}));
 }
 
 void TestCard::init() {

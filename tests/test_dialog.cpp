@@ -66,12 +66,10 @@ void TestDialog::initTestCase() {
     seams_ = std::make_unique<host::ScopedSeams>(&messages_, &windows_);
     QVERIFY(fixture::createDatabase(
         dir_.path(), QStringLiteral("co1.db"),
-        {fixture::kAccountsTable,
-         QStringLiteral("INSERT INTO Accounts (ID, AccountKey) VALUES (1, '1001')")}));
-    QVERIFY(
-        fixture::createDatabase(dir_.path(), QStringLiteral("co2.db"), {fixture::kAccountsTable}));
+        {QStringLiteral("INSERT INTO Accounts (ID, AccountKey) VALUES (1, '1001')")}));
+    QVERIFY(fixture::createDatabase(dir_.path(), QStringLiteral("co2.db"), {}));
     QVERIFY(fixture::createDatabase(dir_.path(), QStringLiteral("noaccounts.db"),
-                                    {fixture::kCompanyTable}));
+                                    {QStringLiteral("DROP TABLE Accounts")}));
 }
 
 void TestDialog::init() {
