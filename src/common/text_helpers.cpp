@@ -3,6 +3,7 @@
 #include "common/decimal_digits.h"
 
 #include <QDateTime>
+#include <optional>
 
 namespace ardcard {
 
@@ -103,6 +104,31 @@ QString PlainText(const QVariant& value) {
     }
 }
 
+namespace {
+// "yyyy-mm-dd" at the start of the text followed by nothing, a space or "T":
+// the usual shape of a stored date, read without building temporary strings
+// (a ledger reads two per line). Anything else goes the general way.
+std::optional<QDate> quickIsoDate(QStringView text) {
+    if (text.size() < 10 || (text.size() > 10 && text[10] != u' ' && text[10] != u'T'))
+        return std::nullopt;
+    int parts[3] = {0, 0, 0};
+    int part = 0;
+    for (qsizetype i = 0; i < 10; ++i) {
+        const char16_t c = text[i].unicode();
+        if (i == 4 || i == 7) {
+            if (c != u'-')
+                return std::nullopt;
+            ++part;
+        } else if (c >= u'0' && c <= u'9') {
+            parts[part] = parts[part] * 10 + (c - u'0');
+        } else {
+            return std::nullopt;
+        }
+    }
+    return QDate(parts[0], parts[1], parts[2]);
+}
+} // namespace
+
 QDate ToDate(const QVariant& value) {
     if (value.isNull())
         return {};
@@ -112,6 +138,8 @@ QDate ToDate(const QVariant& value) {
     case QMetaType::QDateTime:
         return value.toDateTime().date();
     case QMetaType::QString: {
+        if (const auto quick = quickIsoDate(*static_cast<const QString*>(value.constData())))
+            return *quick;
         const QString text = value.toString().trimmed();
         if (text.size() < 10)
             return {};
