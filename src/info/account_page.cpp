@@ -150,46 +150,45 @@ ListSection specialPricesSection(const QString& k) {
 void WriteAccountPage(const QString& path, const QString& accountKey, const QString& connStr,
                       int connType) {
     QString k = KeyLiteral(accountKey, connType);
-    TextFileWriter out(path, TextFileWriter::Unmappable::CharacterReference);
-    WritePageHead(out, QStringLiteral("<TITLE>נתוני חשבון</TITLE>"));
-    WriteFrameOpening(out);
-    out.writeLine(u"<tr valign='top'><td class=Title1 align='right' colspan=2>כרטיס חשבון - "
-                  u"ארדקו חלונות</td></tr>");
+    WritePageFile(path, [&](TextFileWriter& out) {
+        WritePageHead(out, QStringLiteral("<TITLE>נתוני חשבון</TITLE>"));
+        WriteFrameOpening(out);
+        out.writeLine(u"<tr valign='top'><td class=Title1 align='right' colspan=2>כרטיס חשבון - "
+                      u"ארדקו חלונות</td></tr>");
 
-    Recordset rs;
-    rs.Open(QStringLiteral("SELECT Accounts.ID, Accounts.AccountKey, Accounts.FullName"
-                           ", Accounts.Filter, Accounts.SortGroup, Accounts.Agent"
-                           ", Accounts.Address, Accounts.City, Accounts.Zip, Accounts.Country"
-                           ", Accounts.Phone, Accounts.Fax, Accounts.WorF, Accounts.ExFile"
-                           ", Accounts.Details, Accounts.CustomerNote, Accounts.Email"
-                           ", (Select AccSortNames.SortCodeName From AccSortNames"
-                           " Where AccSortNames.AccSortCode = Accounts.SortGroup) As SortName"
-                           ", (Select AWN.Name From AgentWarehouseNames AWN"
-                           " Where AWN.Sort = 1 And AWN.NameID = Accounts.Agent) As AgentName"
-                           " From Accounts"
-                           " Where Accounts.AccountKey =") +
-                k,
-            connStr);
-    if (rs.Bof() && rs.Eof()) {
+        Recordset rs;
+        rs.Open(QStringLiteral("SELECT Accounts.ID, Accounts.AccountKey, Accounts.FullName"
+                               ", Accounts.Filter, Accounts.SortGroup, Accounts.Agent"
+                               ", Accounts.Address, Accounts.City, Accounts.Zip, Accounts.Country"
+                               ", Accounts.Phone, Accounts.Fax, Accounts.WorF, Accounts.ExFile"
+                               ", Accounts.Details, Accounts.CustomerNote, Accounts.Email"
+                               ", (Select AccSortNames.SortCodeName From AccSortNames"
+                               " Where AccSortNames.AccSortCode = Accounts.SortGroup) As SortName"
+                               ", (Select AWN.Name From AgentWarehouseNames AWN"
+                               " Where AWN.Sort = 1 And AWN.NameID = Accounts.Agent) As AgentName"
+                               " From Accounts"
+                               " Where Accounts.AccountKey =") +
+                    k,
+                connStr);
+        if (rs.Bof() && rs.Eof()) {
+            rs.Close();
+            return;
+        }
+        // The later queries use the key as the database keeps it, so a key typed
+        // in another letter case still finds the account's contacts and prices.
+        k = KeyLiteral(ardcard::PlainText(rs.field(QStringLiteral("AccountKey"))), connType);
+
+        out.writeLine(kLayoutRowFirstCell);
+        WriteDetailsSection(out, detailsGroups(rs));
         rs.Close();
-        out.close();
-        return;
-    }
-    // The later queries use the key as the database keeps it, so a key typed
-    // in another letter case still finds the account's contacts and prices.
-    k = KeyLiteral(ardcard::PlainText(rs.field(QStringLiteral("AccountKey"))), connType);
+        WriteExtraFieldsSection(out, rs, connStr, extraQueries(k));
 
-    out.writeLine(kLayoutRowFirstCell);
-    WriteDetailsSection(out, detailsGroups(rs));
-    rs.Close();
-    WriteExtraFieldsSection(out, rs, connStr, extraQueries(k));
+        WriteListSection(out, rs, connStr, contactsSection(k));
+        WriteListSection(out, rs, connStr, alterKeysSection(k));
+        WriteListSection(out, rs, connStr, specialPricesSection(k));
 
-    WriteListSection(out, rs, connStr, contactsSection(k));
-    WriteListSection(out, rs, connStr, alterKeysSection(k));
-    WriteListSection(out, rs, connStr, specialPricesSection(k));
-
-    WriteFrameClosing(out);
-    out.close();
+        WriteFrameClosing(out);
+    });
 }
 
 } // namespace ardcard::info

@@ -23,6 +23,21 @@ double toDouble(const QVariant& value) {
 }
 } // namespace
 
+void WritePageFile(const QString& path, const std::function<void(TextFileWriter&)>& body) {
+    TextFileWriter out(path, TextFileWriter::Unmappable::CharacterReference);
+    try {
+        body(out);
+    } catch (...) {
+        try {
+            out.close();
+        } catch (...) {
+            // The first failure is the one worth reporting.
+        }
+        throw;
+    }
+    out.close();
+}
+
 QString KeyLiteral(const QString& key, int connType) {
     QString doubled = key;
     doubled.replace(u'\'', QStringLiteral("''"));
@@ -64,36 +79,37 @@ void WritePageHead(TextFileWriter& out, const QString& titleLine, const QStringL
 }
 
 void WriteWaitPage(const QString& path) {
-    TextFileWriter out(path, TextFileWriter::Unmappable::CharacterReference);
-    writeLines(out,
-               {
-                   u"<HTML>",
-                   u"<HEAD>",
-                   u"<TITLE>ולמור מערכות מידע</TITLE>",
-                   u"<meta http-equiv='Content-Type' content='text/html; charset=windows-1255'>",
-                   u"<style>",
-                   u"  BODY {direction:rtl; background:#FFFFFF ;margin-top:10; margin-left:10; "
-                   u"margin-right:10; vertical-align:top;}",
-                   u"  TABLE {border: thin solid #5F8EBE; padding: 2 2 2 2; border-spacing: 2; "
-                   u"border-collapse: separate}",
-                   u"  TD {font-size : 9pt; color: black; font-family: arial; text-align: center}",
-                   u"  A {text-decoration: none}",
-                   u"  .TblClean {border: none}",
-                   u"  .Title1 {font-size : 12pt; color: #5F8EBE; font-family: arial; font-weight "
-                   u": bold;}",
-                   u"  .Velmor {font-size : 8pt; color: black; font-family: arial;}",
-                   u"</style>",
-                   u"</HEAD>",
-                   u"<BODY TEXT='#000000' LINK='#0000FF' VLINK='#800080'>",
-                   u"<table height='100%' width='100%' border='0' cellpadding='3' cellspacing='3'>",
-                   u"<tr width='100%' valign='middle'>",
-                   u"<td width='100%' class=Title1>אוסף נתונים. נא להמתין...</td>",
-                   u"</tr>",
-                   u"</table>",
-                   u"</BODY>",
-                   u"</HTML>",
-               });
-    out.close();
+    WritePageFile(path, [](TextFileWriter& out) {
+        writeLines(
+            out,
+            {
+                u"<HTML>",
+                u"<HEAD>",
+                u"<TITLE>ולמור מערכות מידע</TITLE>",
+                u"<meta http-equiv='Content-Type' content='text/html; charset=windows-1255'>",
+                u"<style>",
+                u"  BODY {direction:rtl; background:#FFFFFF ;margin-top:10; margin-left:10; "
+                u"margin-right:10; vertical-align:top;}",
+                u"  TABLE {border: thin solid #5F8EBE; padding: 2 2 2 2; border-spacing: 2; "
+                u"border-collapse: separate}",
+                u"  TD {font-size : 9pt; color: black; font-family: arial; text-align: center}",
+                u"  A {text-decoration: none}",
+                u"  .TblClean {border: none}",
+                u"  .Title1 {font-size : 12pt; color: #5F8EBE; font-family: arial; font-weight "
+                u": bold;}",
+                u"  .Velmor {font-size : 8pt; color: black; font-family: arial;}",
+                u"</style>",
+                u"</HEAD>",
+                u"<BODY TEXT='#000000' LINK='#0000FF' VLINK='#800080'>",
+                u"<table height='100%' width='100%' border='0' cellpadding='3' cellspacing='3'>",
+                u"<tr width='100%' valign='middle'>",
+                u"<td width='100%' class=Title1>אוסף נתונים. נא להמתין...</td>",
+                u"</tr>",
+                u"</table>",
+                u"</BODY>",
+                u"</HTML>",
+            });
+    });
 }
 
 void WriteFrameOpening(TextFileWriter& out) {

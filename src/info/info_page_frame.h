@@ -22,6 +22,11 @@ namespace info {
 // address), so notes holding markup are shown as text and cannot break an
 // attribute; the fixed markup and the Hebrew texts are written as they stand.
 
+// Creates the page file, lets `body` write it and closes it. When `body`
+// fails, what it wrote so far is still put into the file before the failure
+// goes on to the caller, so a half-built page holds every line written.
+void WritePageFile(const QString& path, const std::function<void(TextFileWriter&)>& body);
+
 // The key as an SQL string literal: quotes doubled, enclosed in single quotes,
 // and for connection type 2 (a Unicode server) prefixed with N.
 QString KeyLiteral(const QString& key, int connType);

@@ -220,10 +220,10 @@ ListSection treesSection(const QString& k, std::shared_ptr<int> lastTreeType) {
 void WriteItemPage(const QString& path, const QString& itemKey, const QString& connStr,
                    int connType) {
     const QString k = KeyLiteral(itemKey, connType);
-    TextFileWriter out(path, TextFileWriter::Unmappable::CharacterReference);
-
-    Recordset rs;
-    rs.Open(QStringLiteral("Select Items.ID, Items.ItemKey, Items.ItemName, Items.SortGroup"
+    WritePageFile(path, [&](TextFileWriter& out) {
+        Recordset rs;
+        rs.Open(
+            QStringLiteral("Select Items.ID, Items.ItemKey, Items.ItemName, Items.SortGroup"
                            ", Items.Filter, Items.ForignName, Items.SalesUnit"
                            ", Items.Weight, Items.Volume, Items.DefaultWarehouse"
                            ", Items.Localization, Items.BarCode, Items.Quantity"
@@ -232,36 +232,35 @@ void WriteItemPage(const QString& path, const QString& itemKey, const QString& c
                            " Where Items.ItemKey =") +
                 k,
             connStr);
-    if (rs.Bof() && rs.Eof()) {
+        if (rs.Bof() && rs.Eof()) {
+            rs.Close();
+            return;
+        }
+
+        WritePageHead(out, QStringLiteral("<TITLE>נתוני פריט</TITLE>"),
+                      scriptBlock(rs.field(QStringLiteral("ID"))));
+        WriteFrameOpening(out);
+        out.writeLine(u"<tr valign='top'>");
+        out.writeLine(u" <td class=Title1 align='right'>כרטיס פריט - ארדקו חלונות</td>");
+        out.writeLine(
+            u" <td align='left'><a class=VLBut onclick='vbscript:OpenCard()'>לתפריט פריט</a></td>");
+        out.writeLine(u"</tr>");
+
+        out.writeLine(kLayoutRowFirstCell);
+        WriteDetailsSection(out, detailsGroups(rs));
         rs.Close();
-        out.close();
-        return;
-    }
+        WriteExtraFieldsSection(out, rs, connStr, extraQueries(k));
 
-    WritePageHead(out, QStringLiteral("<TITLE>נתוני פריט</TITLE>"),
-                  scriptBlock(rs.field(QStringLiteral("ID"))));
-    WriteFrameOpening(out);
-    out.writeLine(u"<tr valign='top'>");
-    out.writeLine(u" <td class=Title1 align='right'>כרטיס פריט - ארדקו חלונות</td>");
-    out.writeLine(
-        u" <td align='left'><a class=VLBut onclick='vbscript:OpenCard()'>לתפריט פריט</a></td>");
-    out.writeLine(u"</tr>");
+        WriteListSection(out, rs, connStr, priceListsSection(k));
+        WriteListSection(out, rs, connStr, specialPricesSection(k));
+        WriteListSection(out, rs, connStr, alterKeysSection(k));
+        WriteListSection(out, rs, connStr, alternativeItemsSection(k));
+        WriteListSection(out, rs, connStr, treesSection(k, std::make_shared<int>(0)));
+        out.writeLine(kLayoutSecondCell);
+        out.writeLine(u"</td></tr>");
 
-    out.writeLine(kLayoutRowFirstCell);
-    WriteDetailsSection(out, detailsGroups(rs));
-    rs.Close();
-    WriteExtraFieldsSection(out, rs, connStr, extraQueries(k));
-
-    WriteListSection(out, rs, connStr, priceListsSection(k));
-    WriteListSection(out, rs, connStr, specialPricesSection(k));
-    WriteListSection(out, rs, connStr, alterKeysSection(k));
-    WriteListSection(out, rs, connStr, alternativeItemsSection(k));
-    WriteListSection(out, rs, connStr, treesSection(k, std::make_shared<int>(0)));
-    out.writeLine(kLayoutSecondCell);
-    out.writeLine(u"</td></tr>");
-
-    WriteFrameClosing(out);
-    out.close();
+        WriteFrameClosing(out);
+    });
 }
 
 } // namespace ardcard::info
