@@ -109,10 +109,12 @@ QByteArray referenceBytes(const QString& name) {
 // Byte-for-byte comparison; on a difference the written page is kept for diff.
 bool samePage(const QString& pagePath, const QByteArray& expected, const QString& name) {
     const QByteArray actual = readFile(pagePath);
-    if (actual == expected)
-        return true;
-    QDir().mkpath(QStringLiteral(ARDCARD_INFO_ACTUAL_DIR));
     const QString keep = QStringLiteral(ARDCARD_INFO_ACTUAL_DIR "/") + name;
+    if (actual == expected) {
+        QFile::remove(keep); // a difference kept from an earlier run is gone
+        return true;
+    }
+    QDir().mkpath(QStringLiteral(ARDCARD_INFO_ACTUAL_DIR));
     QFile f(keep);
     if (f.open(QIODevice::WriteOnly | QIODevice::Truncate))
         f.write(toUnicode(actual).replace(QStringLiteral("\r\n"), QStringLiteral("\n")).toUtf8());
