@@ -8,6 +8,9 @@
 // <build>/tests/info-actual/<name> and the test prints the diff command:
 //     diff -u tests/reference/info/<name> build/tests/info-actual/<name>
 
+#ifdef ARDCARD_INFO_WITH_CARD
+#include "card/card.h"
+#endif
 #include "common/failure.h"
 #include "common/module_state.h"
 #include "connection/conn_string.h"
@@ -20,6 +23,8 @@
 
 #include <QDir>
 #include <QFile>
+#include <QLabel>
+#include <QLineEdit>
 #include <QSqlDatabase>
 #include <QSqlError>
 #include <QSqlQuery>
@@ -152,6 +157,11 @@ private Q_SLOTS:
     void showInfoOtherTypeWritesOnlyWaitPage();
     void failureHalfWayLeavesWindowOnWaitPage();
 
+#ifdef ARDCARD_INFO_WITH_CARD
+    void cardKeyImageOpensAccountPage_data();
+    void cardKeyImageOpensAccountPage();
+#endif
+
     void checkConnection_data();
     void checkConnection();
 
@@ -159,7 +169,9 @@ private:
     QString connString(const QString& file) const {
         return BuildConnString(dataDir_.path(), QString(), QString(), file, 4);
     }
-    QString tempFile(const QString& name) const { return tmpDir_.path() + u'/' + name; }
+    QString tempFile(const QString& name) const {
+        return tmpDir_.path() + u'/' + name;
+    }
 
     QTemporaryDir tmpDir_;
     QTemporaryDir dataDir_;
@@ -172,6 +184,8 @@ void TestInfo::initTestCase() {
     QVERIFY(tmpDir_.isValid());
     QVERIFY(dataDir_.isValid());
     qputenv("TMPDIR", QFile::encodeName(tmpDir_.path()));
+    // The card reads and writes its stored options; keep them in the test's own place.
+    qputenv("XDG_CONFIG_HOME", QFile::encodeName(dataDir_.path() + QStringLiteral("/config")));
     QCOMPARE(QDir::tempPath(), tmpDir_.path());
     seams_ = std::make_unique<host::ScopedSeams>(&messages_, &windows_);
 
@@ -438,5 +452,44 @@ void TestInfo::checkConnection() {
     QVERIFY(windows_.windows().isEmpty());
 }
 
-QTEST_GUILESS_MAIN(TestInfo)
+#ifdef ARDCARD_INFO_WITH_CARD
+void TestInfo::cardKeyImageOpensAccountPage_data() {
+    QTest::addColumn<QString>("typedKey");
+    QTest::addColumn<bool>("opens");
+    QTest::newRow("key with spaces") << " 1001  " << true;
+    QTest::newRow("empty key") << "   " << false;
+}
+
+// A double click on the card's key image opens the account page of the key
+// on show, through the stored connection values.
+void TestInfo::cardKeyImageOpensAccountPage() {
+    QFETCH(QString, typedKey);
+    QFETCH(bool, opens);
+    Card card;
+    ConnValues& conn = moduleState().conn;
+    const ConnValues saved = conn;
+    conn = ConnValues{dataDir_.path(), QString(), QString(), QStringLiteral("company.db"), 4};
+    auto* keyBox = card.findChild<QLineEdit*>(QStringLiteral("txtAccountKey"));
+    auto* image = card.findChild<QWidget*>(QStringLiteral("imgAccKey"));
+    QVERIFY(keyBox);
+    QVERIFY(image);
+    keyBox->setText(typedKey);
+    QTest::mouseDClick(image, Qt::LeftButton);
+    conn = saved;
+
+    QVERIFY(messages_.messages().isEmpty());
+    if (!opens) {
+        QVERIFY(windows_.windows().isEmpty());
+        return;
+    }
+    const QList<QStringList> expected{
+        {tempFile(QStringLiteral("vlicrd0.htm")), tempFile(QStringLiteral("vlicrd1.htm"))}};
+    QCOMPARE(windows_.windows(), expected);
+    QVERIFY(samePage(tempFile(QStringLiteral("vlicrd1.htm")),
+                     referenceBytes(QStringLiteral("account_1001.htm")),
+                     QStringLiteral("account_1001.htm")));
+}
+#endif
+
+QTEST_MAIN(TestInfo)
 #include "test_info.moc"
