@@ -36,7 +36,4 @@ void Card::PrintButt_Click() {}
 void Card::ExcelButt_Click() {}
 void Card::CmdGraph_Click() {}
 
-// Information page.
-void Card::imgAccKey_DblClick() {}
-
 } // namespace ardcard
