@@ -9,6 +9,7 @@
 //   ARDCARD_REPORTS_KEEP=/tmp/out build/tests/test_reports
 //   diff -u --strip-trailing-cr tests/reference/reports/<file> /tmp/out/<file>
 
+#include "card/card.h"
 #include "common/failure.h"
 #include "common/module_state.h"
 #include "common/text_file_writer.h"
@@ -21,9 +22,13 @@
 #include "reports/report_screen.h"
 #include "reports/statement_writer.h"
 
+#include <QCheckBox>
+#include <QComboBox>
 #include <QDate>
 #include <QDir>
 #include <QFile>
+#include <QLineEdit>
+#include <QPushButton>
 #include <QTemporaryDir>
 #include <QTest>
 #include <memory>
@@ -229,6 +234,12 @@ private Q_SLOTS:
     void outputPathIsInTheTemporaryDirectory();
     void writerReplacesAnExistingFile();
 
+    void cardPrintButtonShowsTheStatement();
+    void cardExcelButtonShowsTheLinkPage();
+    void cardGraphButtonShowsTheGraph();
+    void cardGraphButtonWithNothingToDrawOpensNoWindow();
+    void cardPrintFailureShowsMessageAndNoWindow();
+
 private:
     QTemporaryDir tmp_;
     host::MessageRecorder messages_;
@@ -239,6 +250,8 @@ private:
 void TestReports::initTestCase() {
     QVERIFY(tmp_.isValid());
     qputenv("TMPDIR", QFile::encodeName(tmp_.path()));
+    // The card loads its stored options on creation: keep them in here.
+    qputenv("XDG_CONFIG_HOME", QFile::encodeName(tmp_.filePath(QStringLiteral("config"))));
     seams_ = std::make_unique<host::ScopedSeams>(&messages_, &windows_);
 }
 
@@ -501,5 +514,131 @@ void TestReports::writerReplacesAnExistingFile() {
     compareWithReference(path, QStringLiteral("csv_no_rows.csv"));
 }
 
-QTEST_GUILESS_MAIN(TestReports)
+namespace {
+
+// A card on show with the fixture's account, its grid filled as a fetch
+// leaves it, the output buttons enabled.
+struct CardOnShow {
+    Card card;
+    CardOnShow() {
+        set(QStringLiteral("txtAccountKey"), QStringLiteral("1001"));
+        set(QStringLiteral("txtAccountName"), QStringLiteral("לקוח א"));
+        set(QStringLiteral("txtBalance"), QStringLiteral("1,200.00"));
+        set(QStringLiteral("txtShipBalance"), QStringLiteral("0.00"));
+        set(QStringLiteral("txtOblig"), QStringLiteral("5,000.00"));
+        set(QStringLiteral("txtAddress"), QString());
+        set(QStringLiteral("txtTelephone"), QStringLiteral(" "));
+        set(QStringLiteral("txtDetails"), QStringLiteral("פרטי <לקוח>"));
+        auto* ledger = card.findChild<LedgerModel*>();
+        if (ledger)
+            fillLedger(*ledger, Rows::OneCompany);
+        card.EnableButtons(true);
+    }
+    void set(const QString& name, const QString& text) {
+        if (auto* box = card.findChild<QLineEdit*>(name))
+            box->setText(text);
+    }
+    void click(const QString& name) {
+        if (auto* button = card.findChild<QPushButton*>(name))
+            button->click();
+    }
+};
+
+// The module state a fetch of the fixture leaves: one company whose
+// details cannot be read again (its short name stays), the currency totals.
+void setFetchedState() {
+    ModuleState& state = moduleState();
+    state.CompanyDirText = QStringLiteral("no-such-company.db");
+    setCompanies(state, {QStringLiteral("C:\\Ardeco\\A&B")});
+    state.company.ShortName = QStringLiteral("  חברת הדגמה  ");
+    state.CurrencyCodes[1] = QStringLiteral("ש\"ח");
+    state.CurrencyCodes[2] = QStringLiteral("USD");
+    state.CurrencyCodes[5] = QStringLiteral("EUR");
+    state.CurrencyCodes[22] = QStringLiteral("JPY");
+    state.CurrencyTotals[2] = 249.75;
+    state.CurrencyTotals[5] = -1234.5;
+    state.CurrencyTotals[22] = 0.001;
+}
+
+} // namespace
+
+void TestReports::cardPrintButtonShowsTheStatement() {
+    setFetchedState();
+    CardOnShow shown;
+    QVERIFY(shown.card.findChild<LedgerModel*>());
+    shown.card.findChild<QCheckBox*>(QStringLiteral("chkShowHeadDetails"))->setChecked(true);
+    shown.click(QStringLiteral("PrintButt"));
+
+    const QString path = OutputPath(kStatementFile);
+    QVERIFY(messages_.messages().isEmpty());
+    QCOMPARE(windows_.windows().size(), 1);
+    QCOMPARE(windows_.windows().at(0), QStringList{path});
+    compareWithReference(path, QStringLiteral("statement_details_on.htm"));
+}
+
+void TestReports::cardExcelButtonShowsTheLinkPage() {
+    setFetchedState();
+    CardOnShow shown;
+    shown.card.findChild<QCheckBox*>(QStringLiteral("chkNegdiName"))->setChecked(true);
+    shown.click(QStringLiteral("ExcelButt"));
+
+    const QString page = OutputPath(kCsvPageFile);
+    QVERIFY(messages_.messages().isEmpty());
+    QCOMPARE(windows_.windows().size(), 1);
+    QCOMPARE(windows_.windows().at(0), QStringList{page});
+    compareWithReference(OutputPath(kCsvFile), QStringLiteral("csv_rows_names.csv"));
+    const QString link = QStringLiteral("<A HREF='") + OutputPath(kCsvFile) + u'\'';
+    QVERIFY(actualText(page).contains(link));
+}
+
+void TestReports::cardGraphButtonShowsTheGraph() {
+    setFetchedState();
+    moduleState().company.ShortName = QStringLiteral(" חברת הדגמה ");
+    PeriodTotals& totals = moduleState().periods;
+    totals.add(QDate(2024, 5, 10), 300);
+    totals.add(QDate(2024, 3, 3), -150);
+    totals.add(QDate(2024, 1, 20), 0.4);
+    totals.add(QDate(2027, 2, 14), 75);
+    CardOnShow shown;
+    shown.set(QStringLiteral("txtAccountName"), QStringLiteral("לקוח <א>"));
+    shown.card.findChild<QComboBox*>(QStringLiteral("CmbGraphType"))->setCurrentIndex(1);
+    shown.click(QStringLiteral("CmdGraph"));
+
+    const QString path = OutputPath(kGraphFile);
+    QVERIFY(messages_.messages().isEmpty());
+    QCOMPARE(windows_.windows().size(), 1);
+    QCOMPARE(windows_.windows().at(0), QStringList{path});
+    compareWithReference(path, QStringLiteral("graph_month.htm"));
+}
+
+void TestReports::cardGraphButtonWithNothingToDrawOpensNoWindow() {
+    setFetchedState();
+    QFile::remove(OutputPath(kGraphFile));
+    CardOnShow shown;
+    shown.card.findChild<QComboBox*>(QStringLiteral("CmbGraphType"))->setCurrentIndex(0);
+    shown.click(QStringLiteral("CmdGraph"));
+
+    QCOMPARE(messages_.messages().size(), 1);
+    QCOMPARE(messages_.messages().at(0).icon, host::MessageIcon::Information);
+    QVERIFY(windows_.windows().isEmpty());
+    QVERIFY(!QFile::exists(OutputPath(kGraphFile)));
+}
+
+void TestReports::cardPrintFailureShowsMessageAndNoWindow() {
+    setFetchedState();
+    const QString path = OutputPath(kStatementFile);
+    QFile::remove(path);
+    QVERIFY(QDir().mkpath(path + QStringLiteral("/inner")));
+    CardOnShow shown;
+    shown.click(QStringLiteral("PrintButt"));
+    QDir(path).removeRecursively();
+
+    QCOMPARE(messages_.messages().size(), 1);
+    QCOMPARE(messages_.messages().at(0).title, QStringLiteral("תקלה"));
+    QCOMPARE(messages_.messages().at(0).icon, host::MessageIcon::Critical);
+    QVERIFY(!messages_.messages().at(0).text.isEmpty());
+    QVERIFY(windows_.windows().isEmpty());
+}
+
+QTEST_MAIN(TestReports)
 #include "test_reports.moc"
