@@ -4,6 +4,7 @@
 #include <QVariant>
 #include <QWidget>
 #include <memory>
+#include <optional>
 
 namespace ardcard {
 
@@ -12,6 +13,8 @@ class HostingPage;
 }
 class LedgerModel;
 class TextFileWriter;
+class frmAConn;
+class Recordset;
 struct CardScreen;
 
 // The account card: ardcard's main component.
@@ -126,11 +129,22 @@ private:
     bool readAct7(const QString& compPath, const QString& searchBy, QVariant& searchValue,
                   const QString& startFrom);
     void searchBy(const QString& kind, const QVariant& value);
+    void navigate(const QString& startFrom);
+    void showAccountRow(const Recordset& row);
+    void clearAccountBoxes();
+    // Every step runs; the first failure's description comes back.
+    std::optional<QString> saveOrLoadOptions(int action, const QString& app,
+                                             const QString& section);
+    // The company-directory text from a container, split, and the first
+    // company's details read.
+    void takeCompanyDirs(const QString& text, bool passOverFailures);
+    void readFirstCompanyDetails();
     void connectControls();
     bool eventFilter(QObject* watched, QEvent* event) override;
 
     std::unique_ptr<CardScreen> ui_;
-    LedgerModel* ledger_ = nullptr; // owned by the card (QObject child)
+    LedgerModel* ledger_ = nullptr;  // owned by the card (QObject child)
+    frmAConn* connDialog_ = nullptr; // made on first use, then reused
 };
 
 } // namespace ardcard

@@ -9,6 +9,7 @@ class QLabel;
 class QLineEdit;
 class QPushButton;
 class QTableView;
+class QWidget;
 
 namespace ardcard {
 
@@ -70,6 +71,14 @@ struct CardScreen {
     QLabel* Label13 = nullptr;
     QLabel* Label22 = nullptr;
     QLabel* Label25 = nullptr;
+    // The maker's name, telephone number and web address.
+    QLabel* lblMakerName = nullptr;
+    QLabel* lblMakerPhone = nullptr;
+    QLabel* lblMakerWeb = nullptr;
 };
+
+// Creates every control as a child of `card`, with its object name, caption,
+// items and tool tip, and lays them out right to left. Wires nothing.
+void BuildCardScreen(CardScreen& ui, QWidget* card);
 
 } // namespace ardcard
