@@ -13,6 +13,11 @@ namespace ardcard {
 //
 // As a Qt model the header row is the horizontal header, so model row i is
 // grid row i + 1 and the blank row is the model's last row.
+//
+// Rows are kept typed and formatted only when a cell is asked for. A long
+// read adds rows in two steps: stage() keeps a row out of sight of views and
+// of the grid numbering, commitStaged() shows every staged row with one
+// insertion, so a million lines do not cost a million view updates.
 class LedgerModel : public QAbstractTableModel {
     Q_OBJECT
 public:
@@ -21,9 +26,10 @@ public:
     explicit LedgerModel(QObject* parent = nullptr);
 
     // Grid view (DocLines numbering).
-    int gridRowCount() const { return static_cast<int>(rows_.size()) + 2; }
-    int dataRowCount() const { return static_cast<int>(rows_.size()); }
-    // Text of a cell as the grid shows it; row 0 gives the header texts.
+    int gridRowCount() const { return committed_ + 2; }
+    int dataRowCount() const { return committed_; }
+    // Text of a cell as the grid shows it; row 0 gives the header texts, the
+    // blank row and anything outside the grid an empty text.
     QString cellText(int gridRow, int column) const;
     // The row's details; grid row 0 and the blank row give an empty detail.
     const RowDetail& rowDetail(int gridRow) const;
@@ -31,11 +37,21 @@ public:
 
     // Header text of a column, trailing spaces included; column 16 is empty.
     static QString headerText(int column);
+    // Whether a header click on this column sorts (0, 2, 3, 5 and 6).
+    static bool isSortable(int column);
 
     // Lays the grid out afresh: header and the blank row only.
     void clear();
     // Inserts a row directly above the blank row.
     void append(LedgerRow row);
+    // Room for `more` rows beyond those held and staged, so a read that knows
+    // its count grows the storage once.
+    void reserve(qsizetype more);
+    // Keeps a row for the next commitStaged(); it is not yet part of the grid.
+    void stage(LedgerRow&& row);
+    qsizetype stagedCount() const { return static_cast<qsizetype>(rows_.size()) - committed_; }
+    // Inserts the staged rows above the blank row, in the order staged.
+    void commitStaged();
     // Sorts the data rows numerically ascending by column 0, 2, 3, 5 or 6,
     // each row keeping its details, the blank row staying last; any other
     // column does nothing. Returns whether it sorted.
@@ -49,7 +65,9 @@ public:
                         int role = Qt::DisplayRole) const override;
 
 private:
+    // rows_[0 .. committed_) are in the grid; the rest are staged.
     std::vector<LedgerRow> rows_;
+    int committed_ = 0;
 };
 
 } // namespace ardcard
