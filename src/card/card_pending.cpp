@@ -1,5 +1,5 @@
-// Placeholders for the members that the ledger grid and fetch, the outputs
-// and the information page fill in; each part leaves this file when its own
+// Placeholders for the members that the ledger grid and fetch and the
+// information page fill in; each part leaves this file when its own
 // file takes over.
 
 #include "card/card.h"
@@ -24,17 +24,6 @@ int Card::ReadTransactions7(const QString& /*CompPath*/, const QString& /*pAccou
 }
 void Card::CmdStop_Click() {}
 void Card::DocLines_Click(int /*gridRow*/, int /*column*/) {}
-
-// Outputs.
-void Card::CreateHTML(const QString& /*pFileName*/) {}
-void Card::CreateCSV(const QString& /*pFileName*/) {}
-void Card::CreateCSV_HTML(const QString& /*pFileName*/, const QString& /*CSVFile*/) {}
-void Card::CreateHTMLGraph(const QString& /*pFileName*/, int /*pGraphType*/) {}
-void Card::WriteHeader(TextFileWriter& /*file*/, const QString& /*pTitle*/,
-                       const QString& /*pContent*/) {}
-void Card::PrintButt_Click() {}
-void Card::ExcelButt_Click() {}
-void Card::CmdGraph_Click() {}
 
 // Information page.
 void Card::imgAccKey_DblClick() {}
