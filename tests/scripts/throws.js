@@ -1,0 +1,2 @@
+print("before");
+throw new Error("נכשל בכוונה");
