@@ -86,6 +86,14 @@ TextFileWriter::TextFileWriter(const QString& path, Unmappable mode) : path_(pat
 }
 
 TextFileWriter::~TextFileWriter() {
+    // On a failure path the file keeps what was written before the failure.
+    if (!file_)
+        return;
+    try {
+        flushPending(true);
+    } catch (...) {
+        // the failure that ended the writing is the one worth reporting
+    }
     if (file_)
         std::fclose(file_);
 }

@@ -13,7 +13,8 @@ namespace ardcard {
 // Writes one output file in the windows-1255 code page, every line ended by
 // CR LF; a line may be written in pieces. Opening deletes a file of the same
 // name first. The file is closed by close() or, on any failure path, by the
-// destructor, so no error leaves a file open. Failures throw Failure.
+// destructor, which keeps what was written so far; so no error leaves a file
+// open. Failures throw Failure.
 class TextFileWriter {
 public:
     // What becomes of a character that windows-1255 cannot hold.

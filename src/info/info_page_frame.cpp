@@ -25,16 +25,7 @@ double toDouble(const QVariant& value) {
 
 void WritePageFile(const QString& path, const std::function<void(TextFileWriter&)>& body) {
     TextFileWriter out(path, TextFileWriter::Unmappable::CharacterReference);
-    try {
-        body(out);
-    } catch (...) {
-        try {
-            out.close();
-        } catch (...) {
-            // The first failure is the one worth reporting.
-        }
-        throw;
-    }
+    body(out); // on a failure the writer closes the file with what it holds
     out.close();
 }
 
