@@ -3,16 +3,20 @@
 //
 //   ledger_bench [lines ...]      default: 10000 100000 1000000
 //
-// Company files are generated once into $TMPDIR/ardcard-ledger-bench and
-// reused. For every size it prints
+// Company files (the demo ledger company: one account, `lines` lines) are
+// generated once into $TMPDIR/ardcard-ledger-bench and reused. For every size it prints
 //   (a) bare scan: the main query read forward, every column of every row;
 //   (b) the journal read into the ledger model alone;
 //   (c) the same with a table view attached to the model (offscreen);
-// lines per second, the ratios (b)/(a) and (c)/(a), and the peak resident set
+//   (d) the fetch button of a real card shown offscreen, one company;
+// lines per second, the ratios to (a), and the peak resident set
 // size of the process so far (sizes run in ascending order, so the figure
 // after the largest size is its peak).
 
+#include "card/card.h"
 #include "common/module_state.h"
+#include "demo/demo_builder.h"
+#include "host/seams.h"
 #include "ledger/fetch_command.h"
 #include "ledger/journal_reader.h"
 #include "ledger/journal_sql.h"
@@ -23,6 +27,7 @@
 #include <QDir>
 #include <QElapsedTimer>
 #include <QFile>
+#include <QPushButton>
 #include <QSqlDatabase>
 #include <QSqlError>
 #include <QSqlQuery>
@@ -70,91 +75,6 @@ void check(QSqlQuery& query, bool ok) {
         std::fprintf(stderr, "%s\n", qPrintable(query.lastError().text()));
         std::exit(2);
     }
-}
-
-// One account with `lines` journal lines: each transaction has the account's
-// move and the counter account's, over 50 counter accounts, 4 currencies,
-// some 20 years of dates, every description different.
-void buildCompany(const QString& path, int lines) {
-    QFile::remove(path);
-    const QString name = QStringLiteral("bench-build");
-    {
-        QSqlDatabase db = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), name);
-        db.setDatabaseName(path);
-        if (!db.open()) {
-            std::fprintf(stderr, "cannot create %s\n", qPrintable(path));
-            std::exit(2);
-        }
-        QSqlQuery q(db);
-        const char* ddl[] = {
-            "PRAGMA journal_mode=OFF",
-            "PRAGMA synchronous=OFF",
-            "CREATE TABLE JurnalTrans (TransID INTEGER PRIMARY KEY, Type INTEGER, Status "
-            "INTEGER, FixedID INTEGER, ValueDate DATETIME, DueDate DATETIME, BatchNo INTEGER, "
-            "Referance INTEGER, Ref2 INTEGER, Description TEXT, CostCode TEXT, TransType TEXT, "
-            "CurrencyCode TEXT, TransDebID TEXT, TransCredID TEXT)",
-            "CREATE TABLE JurnalTransMoves (ID INTEGER PRIMARY KEY, TransID INTEGER, AccountKey "
-            "TEXT, SuF REAL, SuFDlr REAL, DebitCredit INTEGER, FullMatch INTEGER)",
-            "CREATE TABLE Currencies (ID INTEGER, CurrencyCode TEXT PRIMARY KEY)",
-            "CREATE TABLE Accounts (AccountKey TEXT PRIMARY KEY, FullName TEXT, Filter TEXT)",
-        };
-        for (const char* sql : ddl)
-            check(q, q.exec(QString::fromLatin1(sql)));
-        db.transaction();
-        const QStringList codes = {QStringLiteral("ש\"ח"), QStringLiteral("$"),
-                                   QStringLiteral("EUR"), QStringLiteral("GBP")};
-        for (int i = 0; i < codes.size(); ++i) {
-            q.prepare(QStringLiteral("INSERT INTO Currencies VALUES (?, ?)"));
-            q.addBindValue(i + 1);
-            q.addBindValue(codes[i]);
-            check(q, q.exec());
-        }
-        for (int i = 0; i <= 50; ++i) {
-            q.prepare(QStringLiteral("INSERT INTO Accounts VALUES (?, ?, '')"));
-            q.addBindValue(QString::number(1001 + i * 1000));
-            q.addBindValue(QStringLiteral("חשבון %1").arg(i));
-            check(q, q.exec());
-        }
-        QSqlQuery t(db);
-        t.prepare(QStringLiteral("INSERT INTO JurnalTrans VALUES "
-                                 "(?, 0, 1, 0, ?, ?, ?, ?, ?, ?, ?, '', ?, ?, ?)"));
-        QSqlQuery m(db);
-        m.prepare(QStringLiteral("INSERT INTO JurnalTransMoves (TransID, AccountKey, SuF, SuFDlr, "
-                                 "DebitCredit, FullMatch) VALUES (?, ?, ?, ?, ?, ?)"));
-        const QDate start(2006, 1, 1);
-        for (int i = 1; i <= lines; ++i) {
-            const QDate date = start.addDays((i * 7LL) % 7300);
-            const QString counter = QString::number(2001 + (i % 50) * 1000);
-            const bool debit = i % 3 != 0;
-            const double amount = (i % 997) * 10.5 + 1;
-            t.addBindValue(i);
-            t.addBindValue(date.toString(Qt::ISODate));
-            t.addBindValue(date.addDays(30).toString(Qt::ISODate));
-            t.addBindValue(i / 100 + 1);
-            t.addBindValue(100000 + i);
-            t.addBindValue(i % 5 == 0 ? QVariant() : QVariant(i % 1000));
-            t.addBindValue(QStringLiteral("חשבונית מס %1 ללקוח").arg(i));
-            t.addBindValue(i % 4 == 0 ? QVariant() : QVariant(QStringLiteral("C%1").arg(i % 7)));
-            t.addBindValue(codes[i % codes.size()]);
-            t.addBindValue(debit ? kAccount : counter);
-            t.addBindValue(debit ? counter : kAccount);
-            check(t, t.exec());
-            for (int side = 0; side < 2; ++side) {
-                m.addBindValue(i);
-                m.addBindValue(side == 0 ? kAccount : counter);
-                m.addBindValue(amount);
-                m.addBindValue(amount / 3.7);
-                m.addBindValue(side == 0 ? (debit ? 0 : 1) : (debit ? 1 : 0));
-                m.addBindValue(i % 4 == 1 ? i : 0);
-                check(m, m.exec());
-            }
-        }
-        check(q, q.exec(QStringLiteral("CREATE INDEX MovesByAccount ON JurnalTransMoves "
-                                       "(AccountKey)")));
-        db.commit();
-        db.close();
-    }
-    QSqlDatabase::removeDatabase(name);
 }
 
 // (a): what reading the rows costs with nothing done with them.
@@ -219,12 +139,34 @@ Timing ledgerRead(const QString& path, bool withView, qint64& rows) {
     return seconds;
 }
 
+// (d): the fetch button of a real card on the screen, one company.
+Timing cardFetch(const QString& path, qint64& rows) {
+    Card card;
+    // The card loads the stored connection values when it is made.
+    moduleState().conn = ConnValues{};
+    moduleState().conn.ConnType = 4;
+    card.resize(1200, 800);
+    card.show();
+    QApplication::processEvents();
+    moduleState().CompanyDirText = path;
+    card.setAccountKey(kAccount);
+    const Clock clock;
+    card.findChild<QPushButton*>(QStringLiteral("ShowTransButt"))->click();
+    QApplication::processEvents();
+    const Timing seconds{clock.wallSeconds(), clock.cpu()};
+    rows = card.ledger().dataRowCount();
+    return seconds;
+}
+
 } // namespace
 
 int main(int argc, char** argv) {
     if (qEnvironmentVariableIsEmpty("QT_QPA_PLATFORM"))
         qputenv("QT_QPA_PLATFORM", "offscreen");
     QApplication app(argc, argv);
+    // A failure is printed instead of waiting in a message box.
+    host::MessageRecorder messages(true);
+    host::ScopedSeams seams(&messages, nullptr);
     QList<int> sizes;
     for (int i = 1; i < argc; ++i)
         sizes.append(QString::fromLocal8Bit(argv[i]).toInt());
@@ -237,14 +179,14 @@ int main(int argc, char** argv) {
     moduleState().conn.ConnType = 4; // a database file named by the directory entry
 
     std::printf("lines/second on CPU time (wall time in brackets); ratios on CPU time\n");
-    std::printf("%9s %20s %20s %20s %6s %6s %8s\n", "lines", "(a) scan", "(b) model", "(c) view",
-                "b/a", "c/a", "RSS MB");
+    std::printf("%9s %19s %19s %19s %19s %5s %5s %5s %7s\n", "lines", "(a) scan", "(b) model",
+                "(c) view", "(d) card", "b/a", "c/a", "d/a", "RSS MB");
     for (const int lines : sizes) {
-        const QString path = dir + QStringLiteral("/ledger_%1.db").arg(lines);
+        const QString path = dir + QStringLiteral("/ledger_demo_%1.db").arg(lines);
         if (!QFile::exists(path)) {
             QElapsedTimer build;
             build.start();
-            buildCompany(path, lines);
+            demo::BuildLedgerCompany(path, kAccount, lines);
             std::fprintf(stderr, "built %s in %.1f s\n", qPrintable(path),
                          build.nsecsElapsed() / 1e9);
         }
@@ -255,14 +197,18 @@ int main(int argc, char** argv) {
         const Timing a = bareScan(path, scanned);
         const Timing b = ledgerRead(path, false, modelRows);
         const Timing c = ledgerRead(path, true, viewRows);
-        if (scanned != lines || modelRows != lines || viewRows != lines)
-            std::fprintf(stderr, "row counts differ: %lld %lld %lld\n",
+        qint64 cardRows = 0;
+        const Timing d = cardFetch(path, cardRows);
+        if (scanned != lines || modelRows != lines || viewRows != lines || cardRows != lines)
+            std::fprintf(stderr, "row counts differ: %lld %lld %lld %lld\n",
                          static_cast<long long>(scanned), static_cast<long long>(modelRows),
-                         static_cast<long long>(viewRows));
+                         static_cast<long long>(viewRows), static_cast<long long>(cardRows));
         const auto rate = [lines](double seconds) { return lines / seconds; };
-        std::printf("%9d %9.0f (%8.0f) %9.0f (%8.0f) %9.0f (%8.0f) %6.2f %6.2f %8ld\n", lines,
-                    rate(a.cpu), rate(a.wall), rate(b.cpu), rate(b.wall), rate(c.cpu), rate(c.wall),
-                    b.cpu / a.cpu, c.cpu / a.cpu, peakRssMb());
+        std::printf("%9d %8.0f (%8.0f) %8.0f (%8.0f) %8.0f (%8.0f) %8.0f (%8.0f) %5.2f %5.2f "
+                    "%5.2f %7ld\n",
+                    lines, rate(a.cpu), rate(a.wall), rate(b.cpu), rate(b.wall), rate(c.cpu),
+                    rate(c.wall), rate(d.cpu), rate(d.wall), b.cpu / a.cpu, c.cpu / a.cpu,
+                    d.cpu / a.cpu, peakRssMb());
         std::fflush(stdout);
     }
     return 0;

@@ -1,18 +1,26 @@
 // The ledger: the grid model, the journal SQL, the journal read against real
 // SQLite company files, and the fetch loop over several companies.
 
+#include "card/card.h"
 #include "common/module_state.h"
+#include "demo/demo_builder.h"
+#include "host/seams.h"
 #include "ledger/fetch_command.h"
 #include "ledger/journal_reader.h"
 #include "ledger/journal_sql.h"
 #include "ledger/ledger_model.h"
 
 #include <QAbstractItemModelTester>
+#include <QCheckBox>
 #include <QCoreApplication>
+#include <QFrame>
+#include <QHeaderView>
+#include <QPushButton>
 #include <QSignalSpy>
 #include <QSqlDatabase>
 #include <QSqlError>
 #include <QSqlQuery>
+#include <QTableView>
 #include <QTemporaryDir>
 #include <QTest>
 #include <QUuid>
@@ -750,7 +758,107 @@ private Q_SLOTS:
         QCOMPARE(model.dataRowCount(), 5);
         QCOMPARE(model.rowDetail(5).CompIndex, 2);
     }
+
+    // ---- the card's fetch ----------------------------------------------
+
+    void cardFetchTwoCompanies() {
+        QTemporaryDir dir;
+        const QString a = dir.filePath(u"a.db"_qs);
+        const QString b = dir.filePath(u"b.db"_qs);
+        demo::BuildLedgerCompany(a, u"1001"_qs, 12);
+        demo::BuildLedgerCompany(b, u"1001"_qs, 3);
+        host::MessageRecorder messages;
+        host::ScopedSeams seams(&messages, nullptr);
+        Card card;
+        resetState();
+        moduleState().CompanyDirText = a + u';' + b;
+        card.setAccountKey(u" 1001 "_qs);
+        card.findChild<QPushButton*>(u"ShowTransButt"_qs)->click();
+
+        const LedgerModel& model = card.ledger();
+        QCOMPARE(messages.messages().size(), 0);
+        QCOMPARE(model.gridRowCount(), 17);
+        QCOMPARE(model.cellText(12, 0), u"12"_qs);
+        QCOMPARE(model.cellText(13, 0), u"1"_qs);
+        QCOMPARE(model.rowDetail(12).CompIndex, 1);
+        QCOMPARE(model.rowDetail(13).CompIndex, 2);
+        QCOMPARE(model.cellText(16, 0), QString());
+        QCOMPARE(moduleState().CompanyDirCount, 2);
+        QVERIFY(card.findChild<QPushButton*>(u"PrintButt"_qs)->isEnabled());
+        QVERIFY(card.findChild<QPushButton*>(u"ExcelButt"_qs)->isEnabled());
+        QVERIFY(card.findChild<QPushButton*>(u"CmdGraph"_qs)->isEnabled());
+        QCOMPARE(card.findChild<QFrame*>(u"ProgressFill"_qs)->width(), 0);
+
+        // A header click on the row-number column sorts, the blank row staying last.
+        QHeaderView* header = card.findChild<QTableView*>(u"DocLines"_qs)->horizontalHeader();
+        Q_EMIT header->sectionClicked(0);
+        QCOMPARE(model.cellText(1, 0), u"1"_qs);
+        QCOMPARE(model.cellText(2, 0), u"1"_qs);
+        QCOMPARE(model.rowDetail(1).CompIndex, 1);
+        QCOMPARE(model.rowDetail(2).CompIndex, 2);
+        QCOMPARE(model.cellText(16, 0), QString());
+
+        // An empty key text changes nothing.
+        card.setAccountKey(QString());
+        card.findChild<QPushButton*>(u"ShowTransButt"_qs)->click();
+        QCOMPARE(model.gridRowCount(), 17);
+    }
+
+    void cardReadFailureShowsMessage() {
+        QTemporaryDir dir;
+        const QString good = dir.filePath(u"good.db"_qs);
+        demo::BuildLedgerCompany(good, u"1001"_qs, 2);
+        host::MessageRecorder messages;
+        host::ScopedSeams seams(&messages, nullptr);
+        Card card;
+        resetState();
+        moduleState().CompanyDirText = dir.filePath(u"missing.db"_qs) + u';' + good;
+        card.setAccountKey(u"1001"_qs);
+        card.findChild<QPushButton*>(u"ShowTransButt"_qs)->click();
+        QCOMPARE(messages.messages().size(), 1);
+        QCOMPARE(messages.messages().at(0).title, u"תקלה"_qs);
+        QCOMPARE(messages.messages().at(0).icon, host::MessageIcon::Information);
+        // The fetch goes on with the next company.
+        QCOMPARE(card.ledger().dataRowCount(), 2);
+        QCOMPARE(card.ledger().rowDetail(1).CompIndex, 2);
+    }
+
+    void cardStopBeforeFirstRead() {
+        QTemporaryDir dir;
+        const QString a = dir.filePath(u"a.db"_qs);
+        demo::BuildLedgerCompany(a, u"1001"_qs, 4);
+        host::MessageRecorder messages;
+        host::ScopedSeams seams(&messages, nullptr);
+        Card card;
+        resetState();
+        moduleState().CompanyDirText = a;
+        card.setAccountKey(u"1001"_qs);
+        // A stop click waiting in the queue is handled at the first yield.
+        QPushButton* stop = card.findChild<QPushButton*>(u"CmdStop"_qs);
+        QMetaObject::invokeMethod(stop, &QPushButton::click, Qt::QueuedConnection);
+        card.findChild<QPushButton*>(u"ShowTransButt"_qs)->click();
+        QCOMPARE(card.ledger().gridRowCount(), 2);
+        QVERIFY(!card.findChild<QPushButton*>(u"PrintButt"_qs)->isEnabled());
+        QVERIFY(moduleState().StopFlag);
+    }
+
+    void cardGraphOnly() {
+        QTemporaryDir dir;
+        const QString a = dir.filePath(u"a.db"_qs);
+        demo::BuildLedgerCompany(a, u"1001"_qs, 6);
+        host::MessageRecorder messages;
+        host::ScopedSeams seams(&messages, nullptr);
+        Card card;
+        resetState();
+        moduleState().CompanyDirText = a;
+        card.findChild<QCheckBox*>(u"ChkOnlyGraph"_qs)->setChecked(true);
+        card.setAccountKey(u"1001"_qs);
+        card.findChild<QPushButton*>(u"ShowTransButt"_qs)->click();
+        QCOMPARE(card.ledger().gridRowCount(), 2);
+        QVERIFY(!moduleState().periods.yearsDescending(PeriodTotals::Month).empty());
+        QVERIFY(card.findChild<QPushButton*>(u"PrintButt"_qs)->isEnabled());
+    }
 };
 
-QTEST_GUILESS_MAIN(TestLedger)
+QTEST_MAIN(TestLedger)
 #include "test_ledger.moc"
