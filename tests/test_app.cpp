@@ -129,8 +129,10 @@ void TestApp::failure_isAMessageLineOnStderr() {
                                         script("missing_db.js")} +
                             fixturePage());
     QVERIFY2(run.code == 0, qPrintable(run.err));
-    QCOMPARE(run.out, QStringLiteral("messages: 1 critical תקלה בקריאת החשבונות\n"
+    // The lookup's message, then the fetch's own for the same missing file.
+    QCOMPARE(run.out, QStringLiteral("messages: 2 critical תקלה בקריאת החשבונות\n"
                                      "after clear: 0\n"));
+    QVERIFY2(run.err.contains(QStringLiteral("message: information: תקלה: ")), qPrintable(run.err));
     QVERIFY2(run.err.contains(QStringLiteral("message: critical: תקלה בקריאת החשבונות: ")),
              qPrintable(run.err));
 }

@@ -940,8 +940,10 @@ void TestCard::showAccount() {
     QCOMPARE(s.CompanyDirText, QStringLiteral("co1.db;co2.db"));
     QCOMPARE(box(*card, QStringLiteral("txtCompPath"))->text(), QStringLiteral("co1.db;co2.db"));
     QCOMPARE(boxTexts(*card), kAccount1);
-    // Neither split nor company details: those of co2 stay.
-    QCOMPARE(s.CompanyDirList, (QStringList{QString(), QStringLiteral("co2.db")}));
+    // The fetch splits the text afresh; the company details are not read again,
+    // so those of co2 stay.
+    QCOMPARE(s.CompanyDirList,
+             (QStringList{QString(), QStringLiteral("co1.db"), QStringLiteral("co2.db")}));
     QCOMPARE(s.company.ShortName, QStringLiteral("שניה"));
 }
 
