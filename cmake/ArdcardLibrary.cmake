@@ -51,6 +51,9 @@ target_link_libraries(ardcard_shared
 target_include_directories(ardcard_shared INTERFACE
   $<BUILD_INTERFACE:${ARDCARD_GENERATED_DIR}>
   $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}>)
+# Everything the objects call is resolved when the library is linked, not
+# first in a container's program.
+target_link_options(ardcard_shared PRIVATE -Wl,--no-undefined)
 set_target_properties(ardcard_shared PROPERTIES
   OUTPUT_NAME ardcard
   EXPORT_NAME card
@@ -59,8 +62,7 @@ set_target_properties(ardcard_shared PROPERTIES
 add_library(ardcard::card ALIAS ardcard_shared)
 
 install(TARGETS ardcard_shared EXPORT ardcardTargets
-  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}
-  INCLUDES DESTINATION ${CMAKE_INSTALL_INCLUDEDIR})
+  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR})
 install(FILES ${ARDCARD_PUBLIC_HEADERS} DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/ardcard)
 
 set(ARDCARD_CMAKE_DIR ${CMAKE_INSTALL_LIBDIR}/cmake/ardcard)
