@@ -58,12 +58,20 @@ void TestEmbed::initTestCase() {
                                  QStringLiteral("--prefix"), prefix()});
     QVERIFY2(run.code == 0, qPrintable(run.err));
 
-    run = runProgram(cmake, {QStringLiteral("-S"), QStringLiteral(ARDCARD_EMBED_SOURCE),
-                             QStringLiteral("-B"), embedBuild(), QStringLiteral("-G"),
-                             QStringLiteral(ARDCARD_GENERATOR),
-                             QStringLiteral("-DCMAKE_PREFIX_PATH=") + prefix(),
-                             QStringLiteral("-DCMAKE_BUILD_TYPE=Release"),
-                             QStringLiteral("-DCMAKE_EXPORT_COMPILE_COMMANDS=ON")});
+    QStringList configure{QStringLiteral("-S"),
+                          QStringLiteral(ARDCARD_EMBED_SOURCE),
+                          QStringLiteral("-B"),
+                          embedBuild(),
+                          QStringLiteral("-G"),
+                          QStringLiteral(ARDCARD_GENERATOR),
+                          QStringLiteral("-DCMAKE_PREFIX_PATH=") + prefix(),
+                          QStringLiteral("-DCMAKE_BUILD_TYPE=Release"),
+                          QStringLiteral("-DCMAKE_EXPORT_COMPILE_COMMANDS=ON")};
+    const QString flags = QStringLiteral(ARDCARD_CONSUMER_FLAGS);
+    if (!flags.isEmpty())
+        configure << QStringLiteral("-DCMAKE_CXX_FLAGS=") + flags
+                  << QStringLiteral("-DCMAKE_EXE_LINKER_FLAGS=") + flags;
+    run = runProgram(cmake, configure);
     QVERIFY2(run.code == 0, qPrintable(run.out + run.err));
     run = runProgram(cmake, {QStringLiteral("--build"), embedBuild()});
     QVERIFY2(run.code == 0, qPrintable(run.out + run.err));
