@@ -147,6 +147,11 @@ int main(int argc, char** argv) {
         return 2;
     }
     const app::Arguments& args = parsed.arguments;
+    if (args.help || args.version) {
+        const QByteArray text = (args.help ? app::helpText() : app::versionText()).toUtf8();
+        std::fwrite(text.constData(), 1, size_t(text.size()), stdout);
+        return std::fflush(stdout) == 0 ? 0 : 1;
+    }
 
     if (args.headless)
         qputenv("QT_QPA_PLATFORM", "offscreen");

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/page_window.h"
+#include "host/prepare_web_engine.h"
 
 #include <memory>
 #include <vector>
@@ -28,12 +29,5 @@ private:
     // user has closed its window.
     std::vector<std::unique_ptr<PageWindow>> handles_;
 };
-
-// WebEngine must be told before the QApplication exists that it shares GL
-// contexts with the widgets, and Chromium refuses to run its sandbox as
-// root. Call this first thing in main() of every program that may show a
-// page window, after choosing the platform: on the offscreen platform the
-// GPU is left out as well, so that pages render where no display exists.
-void prepareWebEngine();
 
 } // namespace ardcard::host
