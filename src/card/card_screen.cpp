@@ -266,6 +266,10 @@ QTableView* ledgerGrid(QWidget* card) {
     grid->horizontalHeader()->setSectionsClickable(true);
     grid->horizontalHeader()->setSectionResizeMode(QHeaderView::Interactive);
     grid->horizontalHeader()->setDefaultAlignment(Qt::AlignLeading | Qt::AlignVCenter);
+    // Columns open as wide as their headers; a short header ("מט") must not
+    // leave its codes cut to an ellipsis.
+    grid->horizontalHeader()->setMinimumSectionSize(
+        grid->fontMetrics().horizontalAdvance(QStringLiteral("00000")));
     grid->setMinimumHeight(160);
     return grid;
 }
