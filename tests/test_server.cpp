@@ -31,6 +31,7 @@
 #include <QPushButton>
 #include <QSettings>
 #include <QTest>
+#include <QTimer>
 
 #include <arpa/inet.h>
 #include <fcntl.h>
@@ -644,8 +645,7 @@ void TestServer::serverStoppedBetweenCompanies() {
             if (armed)
                 return;
             armed = true;
-            QMetaObject::invokeMethod(
-                this, [this] { stopServer(); }, Qt::QueuedConnection);
+            QTimer::singleShot(0, this, &TestServer::stopServer);
         });
     click(*card, QStringLiteral("ShowTransButt"));
     disconnect(hook);
