@@ -42,6 +42,19 @@ bool declaredAsDate(const char* decl) {
     return type.contains("DATE") || type.contains("TIME");
 }
 
+// Qt's ODBC driver puts "DSN=" in front of any text that names neither a
+// driver nor a server, so a data-source string handed over as it is would
+// ask for a data source called "DSN=name" and never connect.
+QString odbcDatabaseName(const DriverTarget& target) {
+    const QString& name = target.databaseName;
+    const QString dsn = QStringLiteral("DSN=");
+    if (target.driver != QStringLiteral("QODBC") || !name.startsWith(dsn, Qt::CaseInsensitive) ||
+        name.contains(QStringLiteral("DRIVER="), Qt::CaseInsensitive) ||
+        name.contains(QStringLiteral("SERVER="), Qt::CaseInsensitive))
+        return name;
+    return name.mid(dsn.size());
+}
+
 } // namespace
 
 Connection::Connection() : name_(nextConnectionName()) {}
@@ -59,7 +72,7 @@ void Connection::open(const QString& connStr) {
     if (!QSqlDatabase::isDriverAvailable(target.driver))
         throw Failure(QStringLiteral("מנהל ההתקן %1 אינו מותקן").arg(target.driver));
     db_ = QSqlDatabase::addDatabase(target.driver, name_);
-    db_.setDatabaseName(target.databaseName);
+    db_.setDatabaseName(odbcDatabaseName(target));
     db_.setConnectOptions(target.options);
     sqlite_ = target.driver == QStringLiteral("QSQLITE");
     if (!db_.open())
