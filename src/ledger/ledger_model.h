@@ -45,8 +45,10 @@ public:
     };
     struct CellView {
         bool isAscii = false;
-        std::string_view ascii; // when isAscii
-        QStringView text;       // otherwise
+        // When isAscii: only digits and "-,./" (numbers and dates), never a
+        // character a page must escape.
+        std::string_view ascii;
+        QStringView text; // otherwise
     };
     CellView cellView(int gridRow, int column, CellScratch& scratch) const;
     // The row's details; grid row 0 and the blank row give an empty detail.

@@ -11,12 +11,21 @@ namespace {
 // Grid columns 0 to 12 are exported; the grid's last four stay on screen.
 constexpr int kLastExportedColumn = LedgerModel::kColumns - 5;
 
-// A cell's text without the characters a field may not carry.
+// A cell's text without the characters a field may not carry; of those a
+// formatted number can hold only the thousands commas, dropped here in a
+// local copy so that the field goes to the file in one piece.
 void writeField(TextFileWriter& file, const LedgerModel::CellView& cell) {
-    if (cell.isAscii)
-        WriteStripped(file, cell.ascii);
-    else
+    if (cell.isAscii) {
+        char field[kNumberTextMax];
+        char* out = field;
+        for (const char c : cell.ascii) {
+            *out = c;
+            out += c != ',' ? 1 : 0;
+        }
+        file.writeAscii(std::string_view(field, static_cast<size_t>(out - field)));
+    } else {
         WriteStripped(file, cell.text);
+    }
 }
 
 // The company directory of a row as companyDir() gives it, without a copy

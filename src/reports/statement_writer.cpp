@@ -94,10 +94,11 @@ void writeCompanySeparator(TextFileWriter& file, const QString& companyDirectory
     file.writeLine(kRuleThin);
 }
 
-// A cell's text escaped for the page.
+// A cell's text escaped for the page; a formatted number or date has
+// nothing to escape.
 void writeCell(TextFileWriter& file, const LedgerModel::CellView& cell) {
     if (cell.isAscii)
-        WriteEscaped(file, cell.ascii);
+        file.writeAscii(cell.ascii);
     else
         WriteEscaped(file, cell.text);
 }
