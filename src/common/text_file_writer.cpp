@@ -153,7 +153,8 @@ void TextFileWriter::write(QStringView piece, const Rewrite& rewrite) {
             const char16_t unit = *source;
             if (unit < 64 && ((bits >> unit) & 1) != 0) {
                 const std::string_view with = rewrite.replacement(unit);
-                std::memcpy(out, with.data(), with.size());
+                if (!with.empty()) // an empty view may have no data pointer at all
+                    std::memcpy(out, with.data(), with.size());
                 out += with.size();
                 continue;
             }
@@ -183,7 +184,8 @@ void TextFileWriter::writeAscii(std::string_view ascii, const Rewrite& rewrite) 
             const auto unit = static_cast<unsigned char>(c);
             if (unit < 64 && ((bits >> unit) & 1) != 0) {
                 const std::string_view with = rewrite.replacement(unit);
-                std::memcpy(out, with.data(), with.size());
+                if (!with.empty()) // an empty view may have no data pointer at all
+                    std::memcpy(out, with.data(), with.size());
                 out += with.size();
             } else {
                 *out++ = c;
