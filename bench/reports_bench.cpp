@@ -24,7 +24,7 @@ using namespace ardcard;
 
 namespace {
 
-// The machine is shared: the best of three runs, in processor time of this
+// The machine is shared: the best of five runs, in processor time of this
 // process (user and system, so the floor's write calls count too).
 double cpuNow() {
     timespec t{};
@@ -34,7 +34,7 @@ double cpuNow() {
 
 double secondsOf(const std::function<void()>& work) {
     double best = 1e300;
-    for (int run = 0; run < 3; ++run) {
+    for (int run = 0; run < 5; ++run) {
         const double start = cpuNow();
         work();
         best = std::min(best, cpuNow() - start);

@@ -1,5 +1,6 @@
 // Shared helpers: quote stripping, company-directory splitting, Null
 // helpers, number and date formats, HTML escaping, the windows-1255 writer.
+#include "common/decimal_digits.h"
 #include "common/failure.h"
 #include "common/formats.h"
 #include "common/html_escape.h"
@@ -13,6 +14,10 @@
 #include <QtTest>
 #include <cmath>
 #include <limits>
+#include <random>
+#include <string>
+#include <unicode/ucnv.h>
+#include <vector>
 
 using namespace ardcard;
 
@@ -46,6 +51,15 @@ private Q_SLOTS:
     void writerFailsOnMissingDirectory();
     void writerLargeOutput();
     void moduleStateIsPerThread();
+    void fastRoundingMatchesDecimalDigits();
+    void groupedTextMatchesDecimalDigits();
+    void plainWholeMatchesPlainNumber();
+    void quickDatesMatchCalendar();
+    void writerMatchesIcuForEveryUnit_data();
+    void writerMatchesIcuForEveryUnit();
+    void writerSurrogatesAcrossPieces();
+    void writerRewriteMatchesHtmlEscape();
+    void writerAsciiAndClosed();
 };
 
 void TestCommon::stripQuotes_data() {
@@ -356,6 +370,332 @@ void TestCommon::moduleStateIsPerThread() {
     QCOMPARE(seenInThread, QString());
     QCOMPARE(moduleState().CompanyDirText, QStringLiteral("main.db"));
     QCOMPARE(companyDir(moduleState(), 5), QString());
+}
+
+namespace {
+
+// The general rule, written out once more for the comparisons below: the
+// number as 15 significant digits, then half away from zero.
+std::string generalScaled(double value, int decimals) {
+    return detail::roundedScaled(detail::toDecimalDigits(value), decimals);
+}
+
+// Values that make rounding hard: cents and halves of every size, exact
+// binary ties at the 16th digit, neighbours of halves one ulp away, powers
+// of ten and the edges of the fast range, and plain random doubles.
+std::vector<double> hardValues() {
+    std::mt19937_64 random(20240611);
+    std::vector<double> values = {0.0,
+                                  -0.0,
+                                  0.005,
+                                  0.0049999999999999,
+                                  0.00049999999999999,
+                                  0.0005,
+                                  0.5,
+                                  1.005,
+                                  2.345,
+                                  999.995,
+                                  1e-6,
+                                  std::nextafter(1e-6, 0.0),
+                                  9999999999999.995,
+                                  9999999999999.99,
+                                  std::nextafter(1e13, 0.0),
+                                  1e13,
+                                  1234567890123.125,
+                                  1234567890123.375,
+                                  999999999999999.0,
+                                  5e-324,
+                                  std::numeric_limits<double>::max(),
+                                  std::numeric_limits<double>::infinity(),
+                                  std::numeric_limits<double>::quiet_NaN()};
+    for (int e = -7; e <= 13; ++e) {
+        const double p = std::pow(10.0, e);
+        values.insert(values.end(), {p, std::nextafter(p, 0.0), std::nextafter(p, 1e300)});
+    }
+    std::uniform_int_distribution<long long> digits(0, 999999999999999LL);
+    std::uniform_int_distribution<int> scale(0, 18);
+    std::uniform_real_distribution<double> unit(0.0, 1.0);
+    for (int i = 0; i < 50000; ++i) {
+        const long long n = digits(random) >> scale(random);
+        const double p = std::pow(10.0, -scale(random) % 6);
+        const double half = (static_cast<double>(n) + 0.5) * p; // x.5 at some place
+        values.insert(values.end(), {static_cast<double>(n) / 100.0, half,
+                                     std::nextafter(half, 0.0), std::nextafter(half, 1e300)});
+        // Eighths and sixteenths of large numbers are exact ties at 15 digits.
+        const double big = static_cast<double>(digits(random) % 10000000000000LL);
+        values.push_back(big + static_cast<double>(i % 16) / 16.0);
+        values.push_back(std::ldexp(unit(random), static_cast<int>(i % 70) - 26));
+    }
+    const size_t count = values.size();
+    for (size_t i = 0; i < count; ++i)
+        values.push_back(-values[i]);
+    return values;
+}
+
+// Grouped text built from the general digits by hand, independently of the
+// formatter under test.
+QString groupedFromDigits(double value, int decimals, bool emptyWhenZero) {
+    const detail::DecimalDigits d = detail::toDecimalDigits(value);
+    std::string n = detail::roundedScaled(d, decimals);
+    if (n == "0" && emptyWhenZero)
+        return QString();
+    const bool negative = d.negative && n != "0";
+    while (n.size() < static_cast<size_t>(decimals) + 1)
+        n.insert(n.begin(), '0');
+    std::string integer = n.substr(0, n.size() - static_cast<size_t>(decimals));
+    std::string grouped;
+    for (size_t i = 0; i < integer.size(); ++i) {
+        if (i > 0 && (integer.size() - i) % 3 == 0)
+            grouped += ',';
+        grouped += integer[i];
+    }
+    if (decimals > 0)
+        grouped += '.' + n.substr(integer.size());
+    return QString::fromLatin1((negative ? "-" : "") + grouped);
+}
+
+} // namespace
+
+void TestCommon::fastRoundingMatchesDecimalDigits() {
+    int fast = 0;
+    for (const double value : hardValues()) {
+        for (int decimals = 0; decimals <= 3; ++decimals) {
+            std::uint64_t scaled = 0;
+            if (!detail::fastRoundedScaled(value, decimals, scaled))
+                continue;
+            ++fast;
+            if (std::to_string(scaled) != generalScaled(value, decimals))
+                QFAIL(qPrintable(QStringLiteral("%1 at %2 decimals: %3, not %4")
+                                     .arg(value, 0, 'g', 17)
+                                     .arg(decimals)
+                                     .arg(scaled)
+                                     .arg(QString::fromStdString(generalScaled(value, decimals)))));
+        }
+    }
+    QVERIFY(fast > 1000000); // the fast path really ran
+    std::uint64_t scaled = 0;
+    QVERIFY(!detail::fastRoundedScaled(1e13, 2, scaled));
+    QVERIFY(!detail::fastRoundedScaled(std::nan(""), 2, scaled));
+    QVERIFY(!detail::fastRoundedScaled(1.5, 4, scaled));
+}
+
+void TestCommon::groupedTextMatchesDecimalDigits() {
+    const std::vector<double> values = hardValues();
+    for (size_t i = 0; i < values.size(); i += 3) {
+        const double value = values[i];
+        QCOMPARE(FormatMoney(value), groupedFromDigits(value, 2, false));
+        QCOMPARE(FormatQuantity(value), groupedFromDigits(value, 3, false));
+        QCOMPARE(FormatWhole(value), groupedFromDigits(value, 0, true));
+        char buf[kNumberTextMax];
+        const size_t len = FormatMoneyTo(buf, value);
+        QCOMPARE(QString::fromLatin1(buf, static_cast<qsizetype>(len)), FormatMoney(value));
+    }
+    QCOMPARE(FormatGrouped(-1234.56789, 5), QStringLiteral("-1,234.56789"));
+    // 301 integer digits with 100 commas, the sign, the point and two decimals
+    QCOMPARE(FormatGrouped(-1.5e300, 2).size(), 301 + 100 + 1 + 1 + 2);
+}
+
+void TestCommon::plainWholeMatchesPlainNumber() {
+    std::mt19937_64 random(7);
+    std::uniform_int_distribution<long long> whole(-999999999999999LL, 999999999999999LL);
+    char buf[kNumberTextMax];
+    for (int i = 0; i < 100000; ++i) {
+        const double value = static_cast<double>(whole(random) >> (i % 50));
+        const size_t len = PlainWholeTo(buf, value);
+        QVERIFY(len > 0);
+        QCOMPARE(QString::fromLatin1(buf, static_cast<qsizetype>(len)), PlainNumber(value));
+    }
+    QCOMPARE(PlainWholeTo(buf, -0.0), size_t{1});
+    QCOMPARE(buf[0], '0');
+    QCOMPARE(PlainWholeTo(buf, 1e15), size_t{0}); // left to PlainNumber
+    QCOMPARE(PlainWholeTo(buf, 0.5), size_t{0});
+    QCOMPARE(FormatIntegerTo(buf, std::numeric_limits<long long>::min()), size_t{20});
+    QCOMPARE(QByteArray(buf, 20), QByteArray("-9223372036854775808"));
+}
+
+void TestCommon::quickDatesMatchCalendar() {
+    // The years the quick path takes, against Qt's calendar: every day of
+    // 1900 to 2100 and every third day of the rest (3 is prime to the
+    // lengths of weeks, months and years, so every day of the month occurs).
+    const qint64 first = QDate(1000, 1, 1).toJulianDay();
+    const qint64 last = QDate(9999, 12, 31).toJulianDay();
+    const qint64 everyDayFrom = QDate(1900, 1, 1).toJulianDay();
+    const qint64 everyDayTo = QDate(2100, 12, 31).toJulianDay();
+    char buf[kNumberTextMax];
+    for (qint64 jd = first; jd <= last; jd += jd >= everyDayFrom && jd <= everyDayTo ? 1 : 3) {
+        const QDate date = QDate::fromJulianDay(jd);
+        int y = 0;
+        int m = 0;
+        int d = 0;
+        date.getDate(&y, &m, &d);
+        const QByteArray expected = QByteArray::number(100 + d).mid(1) + '/' +
+                                    QByteArray::number(100 + m).mid(1) + '/' +
+                                    QByteArray::number(100 + y % 100).mid(1);
+        const size_t len = FormatShortDateTo(buf, date);
+        if (QByteArray(buf, static_cast<qsizetype>(len)) != expected)
+            QFAIL(qPrintable(date.toString(Qt::ISODate)));
+    }
+    QCOMPARE(FormatShortDateTo(buf, QDate(999, 12, 31)), size_t{0});
+    QCOMPARE(FormatShortDateTo(buf, QDate()), size_t{0});
+    QCOMPARE(FormatLongDate(QDate(1600, 2, 29)), QStringLiteral("29/02/1600"));
+    QCOMPARE(FormatShortDate(QDate(999, 12, 31)), QDate(999, 12, 31).toString(u"dd/MM/yy"));
+}
+
+namespace {
+// windows-1255 of `text` by ICU alone, in one conversion, with the writer's
+// handling of characters the code page cannot hold.
+QByteArray icuBytes(const QString& text, TextFileWriter::Unmappable mode) {
+    UErrorCode status = U_ZERO_ERROR;
+    UConverter* conv = ucnv_open("windows-1255", &status);
+    if (mode == TextFileWriter::Unmappable::CharacterReference) {
+        ucnv_setFromUCallBack(conv, UCNV_FROM_U_CALLBACK_ESCAPE, UCNV_ESCAPE_XML_DEC, nullptr,
+                              nullptr, &status);
+    } else {
+        ucnv_setSubstChars(conv, "?", 1, &status);
+        ucnv_setFromUCallBack(conv, UCNV_FROM_U_CALLBACK_SUBSTITUTE, nullptr, nullptr, nullptr,
+                              &status);
+    }
+    QByteArray out(static_cast<qsizetype>(text.size()) * 12 + 16, '\0');
+    const int32_t n = ucnv_fromUChars(conv, out.data(), static_cast<int32_t>(out.size()),
+                                      reinterpret_cast<const UChar*>(text.utf16()),
+                                      static_cast<int32_t>(text.size()), &status);
+    ucnv_close(conv);
+    if (U_FAILURE(status))
+        return QByteArray("ICU failed");
+    out.truncate(n);
+    return out;
+}
+
+QByteArray writtenInPieces(const QString& text, TextFileWriter::Unmappable mode,
+                           const std::vector<qsizetype>& cuts) {
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("out.txt"));
+    {
+        TextFileWriter w(path, mode);
+        qsizetype from = 0;
+        for (const qsizetype cut : cuts) {
+            w.write(QStringView(text).sliced(from, cut - from));
+            from = cut;
+        }
+        w.write(QStringView(text).sliced(from));
+        w.close();
+    }
+    return readAll(path);
+}
+} // namespace
+
+void TestCommon::writerMatchesIcuForEveryUnit_data() {
+    QTest::addColumn<int>("mode");
+    QTest::newRow("page") << int(TextFileWriter::Unmappable::CharacterReference);
+    QTest::newRow("csv") << int(TextFileWriter::Unmappable::QuestionMark);
+}
+
+void TestCommon::writerMatchesIcuForEveryUnit() {
+    QFETCH(int, mode);
+    const auto unmappable = static_cast<TextFileWriter::Unmappable>(mode);
+    // Every BMP character but the surrogates, each once and each after a
+    // Hebrew letter, in pieces of odd sizes: past the buffer too.
+    QString text;
+    for (char32_t c = 1; c < 0x10000; ++c) {
+        if (c >= 0xD800 && c <= 0xDFFF)
+            continue;
+        text += QChar(static_cast<char16_t>(c));
+        text += QChar(u'\u05D0');
+    }
+    std::vector<qsizetype> cuts;
+    for (qsizetype at = 7; at < text.size(); at += 1 + (at * 31) % 997)
+        cuts.push_back(at);
+    QCOMPARE(writtenInPieces(text, unmappable, cuts), icuBytes(text, unmappable));
+}
+
+void TestCommon::writerSurrogatesAcrossPieces() {
+    const QString emoji = QString::fromUcs4(U"\U0001F600");
+    const QChar lead = emoji[0];
+    const QChar trail = emoji[1];
+    const QString texts[] = {
+        QStringLiteral("a") + emoji + QStringLiteral("b"),
+        QStringLiteral("a") + lead + QStringLiteral("b"),  // a lone high surrogate
+        QStringLiteral("a") + trail + QStringLiteral("b"), // a lone low surrogate
+        QStringLiteral("a") + lead + lead + trail,         // lone, then a pair
+        QStringLiteral("a") + lead,                        // lone at the very end
+        emoji + emoji + QChar(0x0635) + emoji + lead + QChar(0x0635),
+    };
+    for (const QString& text : texts) {
+        for (int m = 0; m < 2; ++m) {
+            const auto mode = static_cast<TextFileWriter::Unmappable>(m);
+            for (qsizetype cut = 0; cut <= text.size(); ++cut)
+                QCOMPARE(writtenInPieces(text, mode, {cut}), icuBytes(text, mode));
+        }
+    }
+    // A held half followed by ASCII bytes is a lone half, as ICU sees it.
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("out.txt"));
+    TextFileWriter w(path, TextFileWriter::Unmappable::CharacterReference);
+    w.write(QString(lead));
+    w.writeAscii("x");
+    w.close();
+    QCOMPARE(readAll(path),
+             icuBytes(QString(lead) + u'x', TextFileWriter::Unmappable::CharacterReference));
+}
+
+void TestCommon::writerRewriteMatchesHtmlEscape() {
+    static constexpr TextFileWriter::Rewrite kEntities{
+        (std::uint64_t{1} << '&') | (std::uint64_t{1} << '<') | (std::uint64_t{1} << '>') |
+            (std::uint64_t{1} << '"') | (std::uint64_t{1} << '\''),
+        [](char16_t c) -> std::string_view {
+            switch (c) {
+            case u'&':
+                return "&amp;";
+            case u'<':
+                return "&lt;";
+            case u'>':
+                return "&gt;";
+            case u'"':
+                return "&quot;";
+            default:
+                return "&#39;";
+            }
+        }};
+    std::mt19937 random(3);
+    const char16_t alphabet[] = u"ab <>&\"'\u05D0\u05EA\u0635\u20AA,.";
+    QString text;
+    for (int i = 0; i < 300000; ++i)
+        text += QChar(alphabet[random() % (std::size(alphabet) - 1)]);
+    QTemporaryDir dir;
+    const QString rewritten = dir.filePath(QStringLiteral("rewritten.htm"));
+    const QString escaped = dir.filePath(QStringLiteral("escaped.htm"));
+    {
+        TextFileWriter w(rewritten, TextFileWriter::Unmappable::CharacterReference);
+        for (qsizetype at = 0; at < text.size(); at += 1000)
+            w.write(QStringView(text).sliced(at, std::min<qsizetype>(1000, text.size() - at)),
+                    kEntities);
+        w.close();
+        TextFileWriter plain(escaped, TextFileWriter::Unmappable::CharacterReference);
+        plain.write(HtmlEscape(text));
+        plain.close();
+    }
+    QCOMPARE(readAll(rewritten), readAll(escaped));
+
+    TextFileWriter ascii(rewritten, TextFileWriter::Unmappable::CharacterReference);
+    ascii.writeAscii("a<b>&'\"c", kEntities);
+    ascii.close();
+    QCOMPARE(readAll(rewritten), QByteArray("a&lt;b&gt;&amp;&#39;&quot;c"));
+}
+
+void TestCommon::writerAsciiAndClosed() {
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("out.csv"));
+    TextFileWriter w(path, TextFileWriter::Unmappable::QuestionMark);
+    const std::string line(3000, 'x');
+    for (int i = 0; i < 1000; ++i) { // three megabytes: past the buffer
+        w.writeAscii(line);
+        w.endLine();
+    }
+    w.close();
+    QCOMPARE(readAll(path).size(), qsizetype{3002 * 1000});
+    QVERIFY_THROWS_EXCEPTION(Failure, w.writeAscii("x"));
+    QVERIFY_THROWS_EXCEPTION(Failure, w.writeAscii(""));
+    QVERIFY_THROWS_EXCEPTION(Failure, w.write(u"x"));
 }
 
 QTEST_GUILESS_MAIN(TestCommon)

@@ -2,6 +2,8 @@
 
 #include <QDate>
 #include <QString>
+#include <cstddef>
+#include <cstdint>
 
 namespace ardcard {
 
@@ -19,5 +21,36 @@ QString FormatGrouped(double value, int decimals, bool emptyWhenZero = false);
 // "dd/mm/yy" and "dd/mm/yyyy".
 QString FormatShortDate(QDate date);
 QString FormatLongDate(QDate date);
+
+// The same texts as ASCII in a caller's buffer, for writers that format
+// millions of cells and should not build a string for each. `out` holds at
+// least kNumberTextMax chars; each returns the length written.
+//
+// Room for any grouped number: the 309 integer digits of the largest double,
+// their 102 commas, a sign, a point and three decimals.
+inline constexpr std::size_t kNumberTextMax = 420;
+std::size_t FormatGroupedTo(char* out, double value, int decimals, bool emptyWhenZero = false);
+inline std::size_t FormatMoneyTo(char* out, double value) {
+    return FormatGroupedTo(out, value, 2);
+}
+// FormatShortDate's text for years 1000 to 9999 (8 chars); 0 for any other
+// date, whose text the caller takes from FormatShortDate.
+std::size_t FormatShortDateTo(char* out, QDate date);
+// The decimal text of a whole number, "-" first when negative (what
+// QString::number gives).
+std::size_t FormatIntegerTo(char* out, long long value);
+std::size_t FormatUnsignedTo(char* out, unsigned long long value);
+// PlainNumber's text for a whole number below 1e15 in magnitude, where its
+// 15 significant digits are the number itself; 0 for any other value, whose
+// text the caller takes from PlainNumber.
+std::size_t PlainWholeTo(char* out, double value);
+
+namespace detail {
+// |value| x 10^decimals rounded the way the formats round (to 15 significant
+// digits first, then half away from zero to `decimals` places), computed
+// exactly in integers for |value| < 1e13 and decimals 0 to 3. Returns false
+// for anything else, which goes the general decimal-digit way.
+bool fastRoundedScaled(double value, int decimals, std::uint64_t& scaled);
+} // namespace detail
 
 } // namespace ardcard

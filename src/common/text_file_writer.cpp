@@ -4,6 +4,7 @@
 
 #include <QFile>
 #include <QFileInfo>
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstring>
@@ -14,7 +15,9 @@
 namespace ardcard {
 
 namespace {
-constexpr size_t kPendingChars = 64 * 1024;
+// One large buffer between the encoder and the file: each write call to the
+// system carries a megabyte, and stdio adds no second copy.
+constexpr size_t kBufferBytes = size_t{1} << 20;
 
 QString systemError(int err) {
     return QString::fromLocal8Bit(std::strerror(err));
@@ -82,7 +85,11 @@ TextFileWriter::TextFileWriter(const QString& path, Unmappable mode) : path_(pat
     file_ = std::fopen(QFile::encodeName(path).constData(), "wbx");
     if (!file_)
         fail(QStringLiteral("לא ניתן ליצור את הקובץ %1"), errno);
-    pending_.reserve(kPendingChars + 1024);
+    std::setvbuf(file_, nullptr, _IONBF, 0);
+    table_ = byteTable().bytes.data();
+    buffer_ = std::make_unique<char[]>(kBufferBytes);
+    cur_ = buffer_.get();
+    end_ = cur_ + kBufferBytes;
 }
 
 TextFileWriter::~TextFileWriter() {
@@ -90,7 +97,8 @@ TextFileWriter::~TextFileWriter() {
     if (!file_)
         return;
     try {
-        flushPending(true);
+        settleHeldLead(nullptr, nullptr, nullptr);
+        flushBuffer();
     } catch (...) {
         // the failure that ended the writing is the one worth reporting
     }
@@ -107,65 +115,167 @@ void TextFileWriter::fail(const QString& what, int err) {
         std::fclose(file_);
         file_ = nullptr;
     }
+    cur_ = end_ = nullptr;
     throw Failure(what.arg(path_) + QStringLiteral(": ") + systemError(err), err);
 }
 
-void TextFileWriter::write(QStringView piece) {
+void TextFileWriter::requireOpen() const {
     if (!file_)
         throw Failure(QStringLiteral("הקובץ %1 כבר נסגר").arg(path_));
-    pending_.append(reinterpret_cast<const char16_t*>(piece.utf16()),
-                    static_cast<size_t>(piece.size()));
-    if (pending_.size() >= kPendingChars)
-        flushPending(false);
 }
 
-void TextFileWriter::endLine() {
-    write(u"\r\n");
+void TextFileWriter::makeRoom(size_t bytes) {
+    if (static_cast<size_t>(end_ - cur_) < bytes)
+        flushBuffer();
 }
 
-void TextFileWriter::flushPending(bool last) {
-    const auto& table = byteTable().bytes;
-    const UChar* const begin = reinterpret_cast<const UChar*>(pending_.data());
-    const UChar* source = begin;
-    const UChar* sourceEnd = begin + pending_.size();
-    // A high surrogate at the end waits for its other half in the next piece.
-    if (!last && source < sourceEnd && U16_IS_LEAD(sourceEnd[-1]))
-        --sourceEnd;
-    // A character reference may take up to 10 bytes for one UTF-16 unit.
-    encoded_.resize(pending_.size() * 10 + 16);
-    char* target = encoded_.data();
-    char* const targetEnd = encoded_.data() + encoded_.size();
-    while (source < sourceEnd) {
-        if (table[*source] != kNoByte) {
-            *target++ = static_cast<char>(table[*source++]);
+void TextFileWriter::write(QStringView piece, const Rewrite& rewrite) {
+    requireOpen();
+    const auto* source = reinterpret_cast<const char16_t*>(piece.utf16());
+    const char16_t* const end = source + piece.size();
+    if (source == end)
+        return;
+    if (heldLead_ != 0)
+        settleHeldLead(source, end, &source);
+    constexpr size_t kMaxBytes = Rewrite::kMaxReplacement; // out of one unit
+    // Locals, not members: stores through a char pointer may alias anything,
+    // and the compiler would reload the members for every unit.
+    const std::uint64_t bits = rewrite.bits;
+    const unsigned short* const table = table_;
+    while (source < end) {
+        makeRoom(kMaxBytes * 256);
+        const auto room = static_cast<size_t>(end_ - cur_) / kMaxBytes;
+        const char16_t* const stop = source + std::min(static_cast<size_t>(end - source), room);
+        char* out = cur_;
+        // One byte per unit while the table knows the unit; the rewritten
+        // characters are all ASCII, so the check comes first.
+        for (; source < stop; ++source) {
+            const char16_t unit = *source;
+            if (unit < 64 && ((bits >> unit) & 1) != 0) {
+                const std::string_view with = rewrite.replacement(unit);
+                if (!with.empty()) // an empty view may have no data pointer at all
+                    std::memcpy(out, with.data(), with.size());
+                out += with.size();
+                continue;
+            }
+            const unsigned short byte = table[unit];
+            if (byte == kNoByte)
+                break;
+            *out++ = static_cast<char>(byte);
+        }
+        cur_ = out;
+        if (source < stop)
+            source = convertUnmapped(source, end);
+    }
+}
+
+void TextFileWriter::writeAscii(std::string_view ascii, const Rewrite& rewrite) {
+    requireOpen();
+    settleHeldLead(nullptr, nullptr, nullptr);
+    constexpr size_t kMaxBytes = Rewrite::kMaxReplacement;
+    const std::uint64_t bits = rewrite.bits; // a local, as in write()
+    while (!ascii.empty()) {
+        makeRoom(kMaxBytes * 256);
+        const size_t n = std::min(ascii.size(), static_cast<size_t>(end_ - cur_) / kMaxBytes);
+        char* out = cur_;
+        const char* const stop = ascii.data() + n;
+        for (const char* p = ascii.data(); p < stop; ++p) {
+            const char c = *p;
+            const auto unit = static_cast<unsigned char>(c);
+            if (unit < 64 && ((bits >> unit) & 1) != 0) {
+                const std::string_view with = rewrite.replacement(unit);
+                if (!with.empty()) // an empty view may have no data pointer at all
+                    std::memcpy(out, with.data(), with.size());
+                out += with.size();
+            } else {
+                *out++ = c;
+            }
+        }
+        cur_ = out;
+        ascii.remove_prefix(n);
+    }
+}
+
+void TextFileWriter::writeAsciiSlow(std::string_view ascii) {
+    requireOpen();
+    settleHeldLead(nullptr, nullptr, nullptr);
+    while (!ascii.empty()) {
+        if (cur_ == end_)
+            flushBuffer();
+        const size_t n = std::min(ascii.size(), static_cast<size_t>(end_ - cur_));
+        std::memcpy(cur_, ascii.data(), n);
+        cur_ += n;
+        ascii.remove_prefix(n);
+    }
+}
+
+// A stretch the table cannot map (unmappable characters, surrogates) goes
+// through ICU with the writer's own callback; returns where the stretch ends.
+const char16_t* TextFileWriter::convertUnmapped(const char16_t* source, const char16_t* end) {
+    const char16_t* stretchEnd = source;
+    while (stretchEnd < end && table_[*stretchEnd] == kNoByte)
+        ++stretchEnd;
+    const char16_t* resume = stretchEnd;
+    if (stretchEnd == end && U16_IS_LEAD(end[-1])) {
+        heldLead_ = end[-1];
+        --stretchEnd;
+    }
+    if (source < stretchEnd)
+        convertWithIcu(source, stretchEnd);
+    return resume;
+}
+
+// The held high surrogate, with the low surrogate that starts the next
+// piece when there is one (then *resume steps past it); alone otherwise, or
+// when no text follows (`next` null), where ICU treats it as a lone unit.
+void TextFileWriter::settleHeldLead(const char16_t* next, const char16_t* end,
+                                    const char16_t** resume) {
+    if (heldLead_ == 0)
+        return;
+    const char16_t pair[2] = {heldLead_, next && next < end ? *next : u'\0'};
+    heldLead_ = 0;
+    if (next && next < end && U16_IS_TRAIL(*next)) {
+        convertWithIcu(pair, pair + 2);
+        *resume = next + 1;
+    } else {
+        convertWithIcu(pair, pair + 1);
+    }
+}
+
+void TextFileWriter::convertWithIcu(const char16_t* source, const char16_t* end) {
+    const auto* from = reinterpret_cast<const UChar*>(source);
+    const auto* const fromEnd = reinterpret_cast<const UChar*>(end);
+    for (;;) {
+        UErrorCode status = U_ZERO_ERROR;
+        ucnv_fromUnicode(converter_.get(), &cur_, end_, &from, fromEnd, nullptr, true, &status);
+        if (status == U_BUFFER_OVERFLOW_ERROR) {
+            flushBuffer(); // ICU keeps what did not fit and goes on
             continue;
         }
-        // A stretch the table cannot map (a pair of surrogates stays in one
-        // stretch) goes through ICU with the writer's own callback.
-        const UChar* stretchEnd = source;
-        while (stretchEnd < sourceEnd && table[*stretchEnd] == kNoByte)
-            ++stretchEnd;
-        UErrorCode status = U_ZERO_ERROR;
-        ucnv_fromUnicode(converter_.get(), &target, targetEnd, &source, stretchEnd, nullptr, true,
-                         &status);
         if (U_FAILURE(status))
             throw Failure(QStringLiteral("שגיאה בהמרת הטקסט לקוד windows-1255: ") +
                           QString::fromLatin1(u_errorName(status)));
-        if (source != stretchEnd)
-            throw Failure(QStringLiteral("שגיאה בהמרת הטקסט לקוד windows-1255"));
+        break;
     }
-    pending_.erase(0, static_cast<size_t>(source - begin));
-    const size_t bytes = static_cast<size_t>(target - encoded_.data());
-    if (bytes > 0 && std::fwrite(encoded_.data(), 1, bytes, file_) != bytes)
+    if (from != fromEnd)
+        throw Failure(QStringLiteral("שגיאה בהמרת הטקסט לקוד windows-1255"));
+}
+
+void TextFileWriter::flushBuffer() {
+    const auto bytes = static_cast<size_t>(cur_ - buffer_.get());
+    cur_ = buffer_.get();
+    if (bytes > 0 && std::fwrite(buffer_.get(), 1, bytes, file_) != bytes)
         fail(QStringLiteral("שגיאה בכתיבת הקובץ %1"), errno);
 }
 
 void TextFileWriter::close() {
     if (!file_)
         return;
-    flushPending(true);
+    settleHeldLead(nullptr, nullptr, nullptr);
+    flushBuffer();
     std::FILE* f = file_;
     file_ = nullptr;
+    cur_ = end_ = nullptr;
     if (std::fflush(f) != 0) {
         const int err = errno;
         std::fclose(f);

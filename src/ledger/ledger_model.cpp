@@ -96,17 +96,83 @@ bool LedgerModel::isSortable(int column) {
     return column == 0 || column == 2 || column == 3 || column == 5 || column == 6;
 }
 
-QString LedgerModel::cellText(int gridRow, int column) const {
-    if (column < 0 || column >= kColumns)
-        return QString();
-    if (gridRow == 0)
-        return headerText(column);
-    if (gridRow < 1 || gridRow > committed_)
-        return QString();
-    const LedgerRow& r = rows_[static_cast<size_t>(gridRow - 1)];
+namespace {
+
+// The text a row holds as it is shown (columns 7, 10 and 12); null for the
+// columns formatted from a typed value.
+const QString* heldText(const LedgerRow& r, int column) {
+    switch (column) {
+    case 7:
+        return &r.description;
+    case 10:
+        return &r.currencyCode;
+    case 12:
+        return &r.costCode;
+    default:
+        return nullptr;
+    }
+}
+
+// A batch or transaction number held as an integer, as QVariant::toString
+// would give it; 0 for anything else (text, a double, Null), which keeps
+// Qt's own conversion.
+size_t variantIntegerTo(char* out, const QVariant& value) {
+    if (value.isNull())
+        return 0;
+    switch (value.typeId()) {
+    case QMetaType::Int:
+        return FormatIntegerTo(out, *static_cast<const int*>(value.constData()));
+    case QMetaType::LongLong:
+        return FormatIntegerTo(out, *static_cast<const qlonglong*>(value.constData()));
+    case QMetaType::UInt:
+        return FormatUnsignedTo(out, *static_cast<const uint*>(value.constData()));
+    case QMetaType::ULongLong:
+        return FormatUnsignedTo(out, *static_cast<const qulonglong*>(value.constData()));
+    default:
+        return 0;
+    }
+}
+
+// The ASCII text of a formatted column into `out`, or 0 when the value
+// needs the general conversion (generalText). Never 0 for a real text: every
+// formatted cell has at least one character.
+size_t formattedTo(char* out, const LedgerRow& r, int column) {
     switch (column) {
     case 0:
-        return QString::number(r.rowNumber);
+        return FormatIntegerTo(out, r.rowNumber);
+    case 1:
+        return FormatShortDateTo(out, r.valueDate);
+    case 2:
+        return variantIntegerTo(out, r.batchNo);
+    case 3:
+        return variantIntegerTo(out, r.transId);
+    case 4:
+        return FormatShortDateTo(out, r.dueDate);
+    case 5:
+        return PlainWholeTo(out, r.referance);
+    case 6:
+        return PlainWholeTo(out, r.ref2);
+    case 8:
+        return FormatMoneyTo(out, r.amount);
+    case 9:
+        return FormatMoneyTo(out, r.foreignAmount);
+    case 11:
+        return FormatMoneyTo(out, r.balance);
+    case 13:
+        return FormatIntegerTo(out, r.fullMatch);
+    case 14:
+    case 15:
+        *out = '0';
+        return 1;
+    default:
+        return FormatIntegerTo(out, r.currencyId);
+    }
+}
+
+// The general text of the columns formattedTo() leaves: odd dates, numbers
+// with a fraction, batch numbers that are not integers.
+QString generalText(const LedgerRow& r, int column) {
+    switch (column) {
     case 1:
         return FormatShortDate(r.valueDate);
     case 2:
@@ -119,26 +185,50 @@ QString LedgerModel::cellText(int gridRow, int column) const {
         return PlainNumber(r.referance);
     case 6:
         return PlainNumber(r.ref2);
-    case 7:
-        return r.description;
-    case 8:
-        return FormatMoney(r.amount);
-    case 9:
-        return FormatMoney(r.foreignAmount);
-    case 10:
-        return r.currencyCode;
-    case 11:
-        return FormatMoney(r.balance);
-    case 12:
-        return r.costCode;
-    case 13:
-        return QString::number(r.fullMatch);
-    case 14:
-    case 15:
-        return QStringLiteral("0");
     default:
-        return QString::number(r.currencyId);
+        return QString();
     }
+}
+
+} // namespace
+
+LedgerModel::CellView LedgerModel::cellView(int gridRow, int column, CellScratch& scratch) const {
+    CellView view;
+    if (column < 0 || column >= kColumns)
+        return view;
+    if (gridRow == 0) {
+        scratch.text = headerText(column);
+        view.text = scratch.text;
+        return view;
+    }
+    if (gridRow < 1 || gridRow > committed_)
+        return view;
+    const LedgerRow& r = rows_[static_cast<size_t>(gridRow - 1)];
+    if (const QString* held = heldText(r, column)) {
+        view.text = *held;
+        return view;
+    }
+    if (const size_t len = formattedTo(scratch.ascii, r, column)) {
+        view.isAscii = true;
+        view.ascii = std::string_view(scratch.ascii, len);
+        return view;
+    }
+    scratch.text = generalText(r, column);
+    view.text = scratch.text;
+    return view;
+}
+
+QString LedgerModel::cellText(int gridRow, int column) const {
+    // Held texts are shared, not copied.
+    if (gridRow >= 1 && gridRow <= committed_ && column >= 0 && column < kColumns) {
+        if (const QString* held = heldText(rows_[static_cast<size_t>(gridRow - 1)], column))
+            return *held;
+    }
+    CellScratch scratch; // its text stays null when there is no cell
+    const CellView view = cellView(gridRow, column, scratch);
+    if (view.isAscii)
+        return QString::fromLatin1(view.ascii.data(), static_cast<qsizetype>(view.ascii.size()));
+    return scratch.text; // the header, a general text, or null for no cell
 }
 
 const RowDetail& LedgerModel::rowDetail(int gridRow) const {

@@ -1,8 +1,10 @@
 #pragma once
 
+#include "common/formats.h"
 #include "ledger/ledger_row.h"
 
 #include <QAbstractTableModel>
+#include <string_view>
 #include <vector>
 
 namespace ardcard {
@@ -31,6 +33,24 @@ public:
     // Text of a cell as the grid shows it; row 0 gives the header texts, the
     // blank row and anything outside the grid an empty text.
     QString cellText(int gridRow, int column) const;
+
+    // The same text for writers that read every cell of a large ledger,
+    // without a string per cell: a view of the text the row holds, or a
+    // number or date formatted as ASCII into the caller's scratch. Values
+    // that need Qt's own conversion land in scratch.text. The view lives
+    // until the scratch is reused or the row changes.
+    struct CellScratch {
+        char ascii[kNumberTextMax];
+        QString text;
+    };
+    struct CellView {
+        bool isAscii = false;
+        // When isAscii: only digits and "-,./" (numbers and dates), never a
+        // character a page must escape.
+        std::string_view ascii;
+        QStringView text; // otherwise
+    };
+    CellView cellView(int gridRow, int column, CellScratch& scratch) const;
     // The row's details; grid row 0 and the blank row give an empty detail.
     const RowDetail& rowDetail(int gridRow) const;
     const LedgerRow& row(int gridRow) const; // grid rows 1..gridRowCount()-2

@@ -10,6 +10,31 @@ namespace ardcard::reports {
 namespace {
 // Grid columns 0 to 12 are exported; the grid's last four stay on screen.
 constexpr int kLastExportedColumn = LedgerModel::kColumns - 5;
+
+// A cell's text without the characters a field may not carry; of those a
+// formatted number can hold only the thousands commas, dropped here in a
+// local copy so that the field goes to the file in one piece.
+void writeField(TextFileWriter& file, const LedgerModel::CellView& cell) {
+    if (cell.isAscii) {
+        char field[kNumberTextMax];
+        char* out = field;
+        for (const char c : cell.ascii) {
+            *out = c;
+            out += c != ',' ? 1 : 0;
+        }
+        file.writeAscii(std::string_view(field, static_cast<size_t>(out - field)));
+    } else {
+        WriteStripped(file, cell.text);
+    }
+}
+
+// The company directory of a row as companyDir() gives it, without a copy
+// of the text for every row.
+QStringView companyDirView(const ModuleState& state, int index) {
+    if (index < 0 || index >= state.CompanyDirList.size())
+        return {};
+    return state.CompanyDirList.at(index);
+}
 } // namespace
 
 void WriteCsv(const QString& path, const LedgerModel& ledger, const ModuleState& state,
@@ -26,22 +51,23 @@ void WriteCsv(const QString& path, const LedgerModel& ledger, const ModuleState&
     file.endLine();
 
     const int lastDataRow = ledger.gridRowCount() - 2;
+    LedgerModel::CellScratch scratch;
     for (int r = 1; r <= lastDataRow; ++r) {
         for (int c = 0; c <= kLastExportedColumn; ++c) {
             if (c > 0)
-                file.write(u",");
-            WriteStripped(file, ledger.cellText(r, c));
+                file.writeAscii(",");
+            writeField(file, ledger.cellView(r, c, scratch));
         }
         const RowDetail& detail = ledger.rowDetail(r);
-        file.write(u",");
+        file.writeAscii(",");
         WriteStripped(file, detail.CounterKey);
         if (withCounterName) {
-            file.write(u",");
+            file.writeAscii(",");
             WriteStripped(file, detail.CounterName);
         }
         if (severalCompanies) {
-            file.write(u",");
-            WriteStripped(file, companyDir(state, detail.CompIndex));
+            file.writeAscii(",");
+            WriteStripped(file, companyDirView(state, detail.CompIndex));
         }
         file.endLine();
     }

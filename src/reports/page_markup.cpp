@@ -3,6 +3,7 @@
 #include "common/text_file_writer.h"
 
 #include <QDir>
+#include <cstdint>
 
 namespace ardcard::reports {
 
@@ -14,51 +15,47 @@ QString OutputPath(QStringView fileName) {
 }
 
 namespace {
-QStringView entityFor(char16_t c) {
+// & < > " and ' are all below 64, so the writer finds them with one bit test
+// per character while it encodes; most cells hold none.
+std::string_view entityFor(char16_t c) {
     switch (c) {
     case u'&':
-        return u"&amp;";
+        return "&amp;";
     case u'<':
-        return u"&lt;";
+        return "&lt;";
     case u'>':
-        return u"&gt;";
+        return "&gt;";
     case u'"':
-        return u"&quot;";
-    case u'\'':
-        return u"&#39;";
+        return "&quot;";
     default:
-        return {};
+        return "&#39;";
     }
 }
+constexpr TextFileWriter::Rewrite kEscapeMarkup{
+    (std::uint64_t{1} << '&') | (std::uint64_t{1} << '<') | (std::uint64_t{1} << '>') |
+        (std::uint64_t{1} << '"') | (std::uint64_t{1} << '\''),
+    entityFor};
+
+// A CSV field loses " ' and , (all below 64 as well).
+constexpr TextFileWriter::Rewrite kStripSeparators{
+    (std::uint64_t{1} << '"') | (std::uint64_t{1} << '\'') | (std::uint64_t{1} << ','),
+    [](char16_t) { return std::string_view(); }};
 } // namespace
 
 void WriteEscaped(TextFileWriter& file, QStringView text) {
-    qsizetype runStart = 0;
-    for (qsizetype i = 0; i < text.size(); ++i) {
-        const QStringView entity = entityFor(text[i].unicode());
-        if (entity.isEmpty())
-            continue;
-        if (i > runStart)
-            file.write(text.sliced(runStart, i - runStart));
-        file.write(entity);
-        runStart = i + 1;
-    }
-    if (runStart < text.size())
-        file.write(text.sliced(runStart));
+    file.write(text, kEscapeMarkup);
+}
+
+void WriteEscaped(TextFileWriter& file, std::string_view ascii) {
+    file.writeAscii(ascii, kEscapeMarkup);
 }
 
 void WriteStripped(TextFileWriter& file, QStringView text) {
-    qsizetype runStart = 0;
-    for (qsizetype i = 0; i < text.size(); ++i) {
-        const char16_t c = text[i].unicode();
-        if (c != u'"' && c != u'\'' && c != u',')
-            continue;
-        if (i > runStart)
-            file.write(text.sliced(runStart, i - runStart));
-        runStart = i + 1;
-    }
-    if (runStart < text.size())
-        file.write(text.sliced(runStart));
+    file.write(text, kStripSeparators);
+}
+
+void WriteStripped(TextFileWriter& file, std::string_view ascii) {
+    file.writeAscii(ascii, kStripSeparators);
 }
 
 QStringView TrimSpaces(QStringView text) {

@@ -94,10 +94,27 @@ void writeCompanySeparator(TextFileWriter& file, const QString& companyDirectory
     file.writeLine(kRuleThin);
 }
 
+// A cell's text escaped for the page; a formatted number or date has
+// nothing to escape.
+void writeCell(TextFileWriter& file, const LedgerModel::CellView& cell) {
+    if (cell.isAscii)
+        file.writeAscii(cell.ascii);
+    else
+        WriteEscaped(file, cell.text);
+}
+
 void writeRows(TextFileWriter& file, const LedgerModel& ledger, const ModuleState& state) {
+    // The row markup is ASCII, written as bytes with its line ends: these
+    // lines are most of a large statement.
+    static constexpr std::string_view kRowOpenLine = "  <tr bgcolor='#FFFFFF' align='right'>\r\n";
+    static constexpr std::string_view kCellOpen = "    <td>";
+    static constexpr std::string_view kCellClose = "</td>\r\n";
+    static constexpr std::string_view kRowClose = "  </tr>\r\n";
+
     const bool severalCompanies = state.CompanyDirCount > 1;
     int lastCompany = 0;
     const int lastDataRow = ledger.gridRowCount() - 2;
+    LedgerModel::CellScratch scratch;
     for (int r = 1; r <= lastDataRow; ++r) {
         if (severalCompanies) {
             // Rows of one directory that are not consecutive (after a sort)
@@ -108,13 +125,13 @@ void writeRows(TextFileWriter& file, const LedgerModel& ledger, const ModuleStat
                 lastCompany = company;
             }
         }
-        file.writeLine(kRowOpen);
+        file.writeAscii(kRowOpenLine);
         for (int c = kLastPrintedColumn; c >= 0; --c) {
-            file.write(u"    <td>");
-            WriteEscaped(file, ledger.cellText(r, c));
-            file.writeLine(u"</td>");
+            file.writeAscii(kCellOpen);
+            writeCell(file, ledger.cellView(r, c, scratch));
+            file.writeAscii(kCellClose);
         }
-        file.writeLine(u"  </tr>");
+        file.writeAscii(kRowClose);
     }
 }
 
