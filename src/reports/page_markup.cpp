@@ -1,13 +1,12 @@
 #include "reports/page_markup.h"
 
 #include "common/text_file_writer.h"
-
-#include <QDir>
+#include "common/text_helpers.h"
 
 namespace ardcard::reports {
 
 QString OutputPath(QStringView fileName) {
-    QString path = QDir::tempPath();
+    QString path = TempDirectory();
     path += u'/';
     path += fileName;
     return path;
