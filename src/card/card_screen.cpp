@@ -14,6 +14,7 @@
 #include <QStyle>
 #include <QTableView>
 #include <QVBoxLayout>
+#include <limits>
 
 namespace ardcard {
 
@@ -32,8 +33,13 @@ QLabel* label(QWidget* parent, const QString& objectName, const QString& caption
     return l;
 }
 
+// A box holds whatever the database or a container puts into it: a line
+// edit's own limit of 32,767 characters would cut a long company-directory
+// text in the middle of a path, and the cut text is what the fetch reads.
 QLineEdit* textBox(QWidget* parent, const QString& objectName) {
-    return named(new QLineEdit(parent), objectName);
+    QLineEdit* box = named(new QLineEdit(parent), objectName);
+    box->setMaxLength(std::numeric_limits<int>::max());
+    return box;
 }
 
 // Money boxes show what the lookup formatted; the clerk does not edit them.

@@ -3,6 +3,7 @@
 #include "common/decimal_digits.h"
 
 #include <QDateTime>
+#include <QDir>
 #include <optional>
 
 namespace ardcard {
@@ -151,6 +152,13 @@ QDate ToDate(const QVariant& value) {
     default:
         return {};
     }
+}
+
+QString TempDirectory() {
+    const QString set = qEnvironmentVariable("TMPDIR");
+    if (!set.isEmpty())
+        return QDir::cleanPath(set);
+    return QDir::tempPath();
 }
 
 } // namespace ardcard

@@ -36,4 +36,11 @@ QString PlainNumber(double value);
 // Null and for anything else.
 QDate ToDate(const QVariant& value);
 
+// The user's temporary directory, where every output page is written: TMPDIR
+// as it is set, else the platform's default. Qt's own answer resolves the path
+// and comes back empty for a directory that does not exist, which would put
+// the pages at the root of the file system; taken as set, such a directory
+// makes the writing fail, and the command says so.
+QString TempDirectory();
+
 } // namespace ardcard

@@ -2,6 +2,7 @@
 
 #include "common/failure.h"
 #include "common/module_state.h"
+#include "common/text_helpers.h"
 #include "connection/conn_string.h"
 #include "connection/database.h"
 #include "host/message_box.h"
@@ -12,7 +13,6 @@
 #include "info/info_page_frame.h"
 #include "info/item_page.h"
 
-#include <QDir>
 #include <functional>
 
 namespace ardcard {
@@ -50,7 +50,7 @@ constexpr int kPassedOverError = 3022;
 Ard7Info::Ard7Info(QObject* parent) : QObject(parent) {}
 
 QString Ard7Info::PagePath(const QString& fileName) {
-    return QDir::tempPath() + u'/' + fileName;
+    return TempDirectory() + u'/' + fileName;
 }
 
 void Ard7Info::OpenItemHTML(const QString& pItemCode, const QString& pConnStr, int pConnType) {

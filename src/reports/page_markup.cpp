@@ -1,14 +1,14 @@
 #include "reports/page_markup.h"
 
 #include "common/text_file_writer.h"
+#include "common/text_helpers.h"
 
-#include <QDir>
 #include <cstdint>
 
 namespace ardcard::reports {
 
 QString OutputPath(QStringView fileName) {
-    QString path = QDir::tempPath();
+    QString path = TempDirectory();
     path += u'/';
     path += fileName;
     return path;
