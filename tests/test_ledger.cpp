@@ -235,6 +235,19 @@ private Q_SLOTS:
         QCOMPARE(model.gridRowCount(), 2);
     }
 
+    // A right-to-left grid draws a signed amount as written; the cell text
+    // that the outputs read carries no mark.
+    void negativeAmountReadsLeftToRight() {
+        LedgerModel model;
+        LedgerRow row = modelRow(1, 7, 1, 1);
+        row.amount = -1234.5;
+        row.balance = 99;
+        model.append(row);
+        QCOMPARE(model.cellText(1, 8), u"-1,234.50"_qs);
+        QCOMPARE(model.data(model.index(0, 8)).toString(), u"\u200E-1,234.50"_qs);
+        QCOMPARE(model.data(model.index(0, 11)).toString(), u"99.00"_qs);
+    }
+
     void sortByColumn_data() {
         QTest::addColumn<int>("column");
         QTest::addColumn<bool>("sorts");

@@ -327,8 +327,15 @@ QVariant LedgerModel::data(const QModelIndex& index, int role) const {
     if (!checkIndex(index, CheckIndexOption::IndexIsValid | CheckIndexOption::ParentIsInvalid))
         return QVariant();
     switch (role) {
-    case Qt::DisplayRole:
-        return cellText(index.row() + 1, index.column());
+    case Qt::DisplayRole: {
+        // The view lays text out right to left, which would draw "-1,234.50"
+        // as "1,234.50-"; a left-to-right mark keeps a signed amount reading
+        // as written. Only what the view draws changes, not the cell's text.
+        QString text = cellText(index.row() + 1, index.column());
+        if (text.startsWith(u'-'))
+            text.prepend(QChar(0x200E));
+        return text;
+    }
     case Qt::TextAlignmentRole:
         return QVariant::fromValue(Qt::Alignment(Qt::AlignLeft | Qt::AlignVCenter));
     default:
