@@ -19,6 +19,7 @@
 #include <QFileInfo>
 #include <QMainWindow>
 #include <QPointer>
+#include <QScreen>
 #include <QStandardPaths>
 #include <cstdio>
 #include <memory>
@@ -120,6 +121,9 @@ int run(const app::Arguments& args) {
         return 1;
     }
     card->InitProperties(page); // first placing: every step goes on after a failure
+    // Room for the grid: the card's own layout fits a handful of ledger rows.
+    const QSize room = window.screen()->availableGeometry().size() * 9 / 10;
+    window.resize(window.sizeHint().expandedTo(QSize(1200, 820)).boundedTo(room));
     window.show();
 
     if (args.script.isEmpty())
