@@ -25,6 +25,7 @@ class TestApp : public QObject {
 private Q_SLOTS:
     void initTestCase();
     void lookup_showsTheAccountThePageNamed();
+    void fetch_sortsByTheClickedHeader();
     void navigation_stepsThroughTheAccounts();
     void failure_isAMessageLineOnStderr();
     void throwingScript_exitsWithOneAndTheError();
@@ -62,6 +63,33 @@ void TestApp::initTestCase() {
     account(1, "1001", QStringLiteral("מאפיית השחר"), "03-5550001", QStringLiteral("חיפה"));
     account(2, "1002", QStringLiteral("נגריית הגליל"), "04-5550002", QStringLiteral("עכו"));
     account(3, "1003", QStringLiteral("דפוס אור"), "08-5550003", QStringLiteral("אילת"));
+    // Three journal lines of 1001, transactions 10, 9 and 2.
+    w.insert(QStringLiteral("Currencies"),
+             {{QStringLiteral("CurrencyCode"), QStringLiteral("שח")}, {QStringLiteral("ID"), 1}});
+    auto line = [&](int transId, const char* date, double amount) {
+        w.insert(QStringLiteral("JurnalTrans"),
+                 {{QStringLiteral("TransID"), transId},
+                  {QStringLiteral("Type"), 0},
+                  {QStringLiteral("Status"), 1},
+                  {QStringLiteral("FixedID"), 0},
+                  {QStringLiteral("ValueDate"), QLatin1String(date)},
+                  {QStringLiteral("DueDate"), QLatin1String(date)},
+                  {QStringLiteral("BatchNo"), 7},
+                  {QStringLiteral("Description"), QStringLiteral("חשבונית")},
+                  {QStringLiteral("CurrencyCode"), QStringLiteral("שח")},
+                  {QStringLiteral("TransDebID"), QStringLiteral("4000")},
+                  {QStringLiteral("TransCredID"), QStringLiteral("1001")}});
+        w.insert(QStringLiteral("JurnalTransMoves"),
+                 {{QStringLiteral("TransID"), transId},
+                  {QStringLiteral("AccountKey"), QStringLiteral("1001")},
+                  {QStringLiteral("SuF"), amount},
+                  {QStringLiteral("SuFDlr"), 0.0},
+                  {QStringLiteral("DebitCredit"), 0},
+                  {QStringLiteral("FullMatch"), 0}});
+    };
+    line(10, "2024-01-05", 100);
+    line(9, "2024-01-06", 50);
+    line(2, "2024-01-07", 25);
     w.commit();
 }
 
@@ -108,6 +136,20 @@ void TestApp::lookup_showsTheAccountThePageNamed() {
                                             "conn: 4 fixture.db\n"
                                             "messages: 0\n");
     QCOMPARE(run.out, expected);
+}
+
+void TestApp::fetch_sortsByTheClickedHeader() {
+    const Run run = ardcard(QStringList{QStringLiteral("--headless"), QStringLiteral("--script"),
+                                        script("fetch_sort.js")} +
+                            fixturePage());
+    QVERIFY2(run.code == 0, qPrintable(run.err));
+    const QString expected = QStringLiteral("found: 1002 AccountName\n"
+                                            "rows: 5 print enabled: true\n"
+                                            "by transaction: 2=25.00 9=50.00 10=100.00\n"
+                                            "still: 2 9 10\n"
+                                            "windows: 1 1\n");
+    QCOMPARE(run.out, expected);
+    QVERIFY2(run.err.contains(QStringLiteral("navigate: 1: ")), qPrintable(run.err));
 }
 
 void TestApp::navigation_stepsThroughTheAccounts() {
