@@ -60,6 +60,12 @@ private Q_SLOTS:
     void writerSurrogatesAcrossPieces();
     void writerRewriteMatchesHtmlEscape();
     void writerAsciiAndClosed();
+    void plainMoneyIsMoneyWithoutCommas_data();
+    void plainMoneyIsMoneyWithoutCommas();
+    void plainMoneyMatchesGroupedText();
+    void writerBlocksMatchIcuForEveryUnit_data();
+    void writerBlocksMatchIcuForEveryUnit();
+    void writerAsciiPiecesOfEverySize();
 };
 
 void TestCommon::stripQuotes_data() {
@@ -696,6 +702,140 @@ void TestCommon::writerAsciiAndClosed() {
     QVERIFY_THROWS_EXCEPTION(Failure, w.writeAscii("x"));
     QVERIFY_THROWS_EXCEPTION(Failure, w.writeAscii(""));
     QVERIFY_THROWS_EXCEPTION(Failure, w.write(u"x"));
+}
+
+void TestCommon::plainMoneyIsMoneyWithoutCommas_data() {
+    QTest::addColumn<double>("value");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("grouped") << 1234567.891 << QStringLiteral("1234567.89");
+    QTest::newRow("negative") << -1234.5 << QStringLiteral("-1234.50");
+    QTest::newRow("negative rounds to zero") << -0.004 << QStringLiteral("0.00");
+    QTest::newRow("half cent up") << 1.005 << QStringLiteral("1.01");
+    QTest::newRow("negative half cent") << -2.345 << QStringLiteral("-2.35");
+    QTest::newRow("below a cent") << 0.05 << QStringLiteral("0.05");
+    QTest::newRow("beyond the fast range") << 1e15 << QStringLiteral("1000000000000000.00");
+    QTest::newRow("edge of the fast range")
+        << 9999999999999.99 << QStringLiteral("9999999999999.99");
+}
+
+void TestCommon::plainMoneyIsMoneyWithoutCommas() {
+    QFETCH(double, value);
+    QFETCH(QString, expected);
+    char buf[kNumberTextMax];
+    const size_t len = FormatMoneyPlainTo(buf, value);
+    QCOMPARE(QString::fromLatin1(buf, static_cast<qsizetype>(len)), expected);
+}
+
+void TestCommon::plainMoneyMatchesGroupedText() {
+    // Every hard value, and the cents of random amounts of every size.
+    std::vector<double> values = hardValues();
+    std::mt19937_64 random(11);
+    std::uniform_int_distribution<long long> cents(-99999999999LL, 99999999999LL);
+    for (int i = 0; i < 200000; ++i)
+        values.push_back(static_cast<double>(cents(random) >> (i % 40)) / 100.0 * 3.7);
+    char buf[kNumberTextMax];
+    for (const double value : values) {
+        const size_t len = FormatMoneyPlainTo(buf, value);
+        QString grouped = groupedFromDigits(value, 2, false);
+        grouped.remove(u',');
+        if (QString::fromLatin1(buf, static_cast<qsizetype>(len)) != grouped)
+            QFAIL(qPrintable(QString::number(value, 'g', 17)));
+    }
+}
+
+namespace {
+// The writer's text with the rewrite done by hand: each character of `from`
+// becomes `to` (which may be empty).
+QString rewrittenByHand(const QString& text, const QString& from, const QString& to) {
+    QString out;
+    for (const QChar c : text)
+        out += from.contains(c) ? to : QString(c);
+    return out;
+}
+} // namespace
+
+void TestCommon::writerBlocksMatchIcuForEveryUnit_data() {
+    QTest::addColumn<int>("mode");
+    QTest::addColumn<QString>("rewritten");
+    QTest::addColumn<QString>("replacement");
+    QTest::newRow("page, none") << int(TextFileWriter::Unmappable::CharacterReference) << QString()
+                                << QString();
+    QTest::newRow("csv, separators dropped")
+        << int(TextFileWriter::Unmappable::QuestionMark) << QStringLiteral("\",'") << QString();
+    // More characters than the encoder lists one by one.
+    QTest::newRow("page, digits and space") << int(TextFileWriter::Unmappable::CharacterReference)
+                                            << QStringLiteral("0123456789 ") << QStringLiteral("#");
+}
+
+void TestCommon::writerBlocksMatchIcuForEveryUnit() {
+    QFETCH(int, mode);
+    QFETCH(QString, rewritten);
+    QFETCH(QString, replacement);
+    const auto unmappable = static_cast<TextFileWriter::Unmappable>(mode);
+    static QByteArray toBytes; // the replacement function has no state of its own
+    toBytes = replacement.toLatin1();
+    std::uint64_t bits = 0;
+    for (const QChar c : rewritten)
+        bits |= std::uint64_t{1} << c.unicode();
+    const TextFileWriter::Rewrite rewrite(bits, [](char16_t) {
+        return std::string_view(toBytes.constData(), static_cast<size_t>(toBytes.size()));
+    });
+    // Every BMP character but the surrogates inside runs of plain text (ASCII
+    // and letters) of lengths 1 to 24, at every place of a run: each lands
+    // in every lane of a block, at the end of a piece and in a repeated last
+    // block. Pieces of odd sizes start at odd places.
+    const QString plain = QStringLiteral("ab\u05D0c 9\u05EA-z\u05D3x/y\u05E9.Q7\u05D5~ m&<");
+    QString text;
+    int n = 0;
+    for (char32_t c = 1; c < 0x10000; ++c) {
+        if (c >= 0xD800 && c <= 0xDFFF)
+            continue;
+        const int run = 1 + n % 24;
+        QString piece = plain.left(run);
+        piece.insert((n / 24) % (run + 1), QChar(static_cast<char16_t>(c)));
+        text += piece;
+        ++n;
+    }
+    std::vector<qsizetype> cuts;
+    for (qsizetype at = 5; at < text.size(); at += 1 + (at * 37) % 61)
+        cuts.push_back(at);
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("out.txt"));
+    {
+        TextFileWriter w(path, unmappable);
+        qsizetype from = 0;
+        for (const qsizetype cut : cuts) {
+            w.write(QStringView(text).sliced(from, cut - from), rewrite);
+            from = cut;
+        }
+        w.write(QStringView(text).sliced(from), rewrite);
+        w.close();
+    }
+    const QByteArray expected = icuBytes(rewrittenByHand(text, rewritten, replacement), unmappable);
+    const QByteArray actual = readAll(path);
+    QCOMPARE(actual.size(), expected.size());
+    QVERIFY(actual == expected);
+}
+
+void TestCommon::writerAsciiPiecesOfEverySize() {
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("out.txt"));
+    std::string all;
+    {
+        TextFileWriter w(path, TextFileWriter::Unmappable::QuestionMark);
+        for (int size = 0; size <= 40; ++size) {
+            for (int i = 0; i < 3; ++i) {
+                std::string piece(static_cast<size_t>(size), 'a');
+                for (int k = 0; k < size; ++k)
+                    piece[static_cast<size_t>(k)] =
+                        static_cast<char>('!' + (k * 7 + size + i) % 90);
+                w.writeAscii(piece);
+                all += piece;
+            }
+        }
+        w.close();
+    }
+    QCOMPARE(readAll(path), QByteArray::fromStdString(all));
 }
 
 QTEST_GUILESS_MAIN(TestCommon)

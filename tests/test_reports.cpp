@@ -222,6 +222,7 @@ private Q_SLOTS:
     void csv_data();
     void csv();
     void csvPage();
+    void rowReadMatchesCellByCell();
 
     void graph_data();
     void graph();
@@ -638,6 +639,56 @@ void TestReports::cardPrintFailureShowsMessageAndNoWindow() {
     QCOMPARE(messages_.messages().at(0).icon, host::MessageIcon::Critical);
     QVERIFY(!messages_.messages().at(0).text.isEmpty());
     QVERIFY(windows_.windows().isEmpty());
+}
+
+void TestReports::rowReadMatchesCellByCell() {
+    // Rows whose cells take every way of formatting: integers and text as
+    // batch numbers, fractions in the references, dates out of the quick
+    // range and none, amounts beyond the fast range.
+    LedgerModel ledger;
+    ledger.append(rowA());
+    ledger.append(rowB());
+    ledger.append(rowC());
+    LedgerRow odd = rowA();
+    odd.batchNo = QStringLiteral("B-7");
+    odd.transId = 12.5;
+    odd.referance = 1.25;
+    odd.ref2 = 1e16;
+    odd.valueDate = QDate(999, 12, 31);
+    odd.dueDate = QDate();
+    odd.amount = -1e15;
+    odd.foreignAmount = -0.004;
+    odd.balance = 1234567.891;
+    ledger.append(odd);
+    LedgerModel::RowCells grouped;
+    LedgerModel::RowCells plain;
+    for (int r = 1; r <= ledger.gridRowCount() - 2; ++r) {
+        ledger.readRow(r, LedgerModel::kColumns - 1, LedgerModel::MoneyText::Grouped, grouped);
+        ledger.readRow(r, LedgerModel::kColumns - 1, LedgerModel::MoneyText::Plain, plain);
+        for (int c = 0; c < LedgerModel::kColumns; ++c) {
+            const QString text = ledger.cellText(r, c);
+            QString withoutCommas = text;
+            if (c == 8 || c == 9 || c == 11)
+                withoutCommas.remove(u',');
+            auto asText = [](const LedgerModel::CellView& v) {
+                return v.isAscii ? QString::fromLatin1(v.ascii.data(),
+                                                       static_cast<qsizetype>(v.ascii.size()))
+                                 : v.text.toString();
+            };
+            QCOMPARE(asText(grouped.cell[c]), text);
+            QCOMPARE(asText(plain.cell[c]), withoutCommas);
+            if (plain.cell[c].isAscii)
+                QVERIFY(plain.cell[c].ascii.find(',') == std::string_view::npos);
+        }
+    }
+    // The amounts of the odd row, written out.
+    QCOMPARE(plain.cell[8].ascii, std::string_view("-1000000000000000.00"));
+    QCOMPARE(plain.cell[9].ascii, std::string_view("0.00"));
+    QCOMPARE(plain.cell[11].ascii, std::string_view("1234567.89"));
+    QCOMPARE(grouped.cell[11].ascii, std::string_view("1,234,567.89"));
+    // Outside the data rows every cell is empty.
+    ledger.readRow(0, 12, LedgerModel::MoneyText::Plain, plain);
+    QVERIFY(!plain.cell[3].isAscii && plain.cell[3].text.isEmpty());
 }
 
 QTEST_MAIN(TestReports)

@@ -2,6 +2,7 @@
 
 #include "common/decimal_digits.h"
 
+#include <algorithm>
 #include <array>
 #include <bit>
 #include <cmath>
@@ -124,6 +125,25 @@ size_t groupedRoom(size_t digitCount, int decimals) {
     return total + total / 3 + 3;
 }
 
+// The common case in plain double arithmetic: below 1e7 with at most two
+// decimals, the 15-digit form of the value times 10^decimals lies within
+// 0.5e-6 of the exact product (half a unit of the 15th digit is at most
+// 0.5 x 10^(6 - 14 + 2)), and the double product within 1.2e-7 of that
+// (2^-53 of a number below 1e9). So when the product's fraction is at least
+// 1e-6 away from one half, both round to the same integer, and no exact
+// half can be involved. Nearer a half the exact way below decides.
+bool quickRoundedScaled(double magnitude, int decimals, std::uint64_t& scaled) {
+    if (magnitude >= 1e7 || decimals > 2)
+        return false;
+    const double product = magnitude * static_cast<double>(kPow10[decimals]);
+    const double whole = std::floor(product);
+    const double fraction = product - whole; // exact, as any double's fraction is
+    if (std::fabs(fraction - 0.5) < 1e-6)
+        return false;
+    scaled = static_cast<std::uint64_t>(whole) + (fraction > 0.5 ? 1 : 0);
+    return true;
+}
+
 } // namespace
 
 bool detail::fastRoundedScaled(double value, int decimals, std::uint64_t& scaled) {
@@ -138,6 +158,8 @@ bool detail::fastRoundedScaled(double value, int decimals, std::uint64_t& scaled
         scaled = 0;
         return true;
     }
+    if (quickRoundedScaled(magnitude, decimals, scaled))
+        return true;
     // magnitude = mantissa x 2^(exp2 - 53), exactly; magnitude is normal here.
     const auto bits = std::bit_cast<std::uint64_t>(magnitude);
     const std::uint64_t mantissa =
@@ -213,6 +235,29 @@ std::size_t FormatGroupedTo(char* out, double value, int decimals, bool emptyWhe
     if (zero && emptyWhenZero)
         return 0;
     return writeGrouped(out, n, decimals, d.negative && !zero);
+}
+
+std::size_t FormatMoneyPlainTo(char* out, double value) {
+    std::uint64_t scaled = 0;
+    if (!detail::fastRoundedScaled(value, 2, scaled)) {
+        // Beyond the fast range (13 digits and more): the grouped text with
+        // its commas taken out, rare enough not to matter.
+        const size_t len = FormatGroupedTo(out, value, 2);
+        char* const end = std::remove(out, out + len, ',');
+        return static_cast<size_t>(end - out);
+    }
+    char buf[24]; // 20 digits, sign and point
+    char* const end = buf + sizeof buf;
+    const auto cents = static_cast<size_t>(scaled % 100) * 2;
+    char* first = digitsBackwards(end - 3, scaled / 100);
+    end[-3] = '.';
+    end[-2] = kDigitPairs[cents];
+    end[-1] = kDigitPairs[cents + 1];
+    if (value < 0 && scaled != 0)
+        *--first = '-';
+    const auto len = static_cast<size_t>(end - first);
+    std::memcpy(out, first, len);
+    return len;
 }
 
 QString FormatGrouped(double value, int decimals, bool emptyWhenZero) {

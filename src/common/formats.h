@@ -33,6 +33,10 @@ std::size_t FormatGroupedTo(char* out, double value, int decimals, bool emptyWhe
 inline std::size_t FormatMoneyTo(char* out, double value) {
     return FormatGroupedTo(out, value, 2);
 }
+// FormatMoney's text without its thousands commas, for the CSV file, whose
+// fields may not carry the separator: the digits are produced without the
+// commas rather than grouped and then dropped.
+std::size_t FormatMoneyPlainTo(char* out, double value);
 // FormatShortDate's text for years 1000 to 9999 (8 chars); 0 for any other
 // date, whose text the caller takes from FormatShortDate.
 std::size_t FormatShortDateTo(char* out, QDate date);

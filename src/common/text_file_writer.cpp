@@ -6,11 +6,16 @@
 #include <QFileInfo>
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <cerrno>
 #include <cstring>
 #include <unicode/ucnv.h>
 #include <unicode/ucnv_err.h>
 #include <unicode/utf16.h>
+
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
 
 namespace ardcard {
 
@@ -30,8 +35,16 @@ QString systemError(int err) {
 // otherwise spend a quarter of its time in the converter's generic path.
 constexpr unsigned short kNoByte = 0x100;
 
+// The Hebrew letters alef to tav, which windows-1255 holds at 0xE0 to 0xFA.
+constexpr char16_t kAlef = 0x05D0;
+constexpr char16_t kTav = 0x05EA;
+constexpr unsigned kHebrewOffset = kAlef - 0xE0;
+
 struct ByteTable {
     std::array<unsigned short, 0x10000> bytes{};
+    // The table holds ASCII as itself and the letters at the fixed offset,
+    // which is all the block encoder below assumes.
+    bool fitsBlocks = false;
     ByteTable() {
         bytes.fill(kNoByte);
         UErrorCode status = U_ZERO_ERROR;
@@ -51,6 +64,11 @@ struct ByteTable {
             ucnv_reset(conv);
         }
         ucnv_close(conv);
+        fitsBlocks = true;
+        for (char16_t c = 0; c < 0x80; ++c)
+            fitsBlocks = fitsBlocks && bytes[c] == c;
+        for (char16_t c = kAlef; c <= kTav; ++c)
+            fitsBlocks = fitsBlocks && bytes[c] == c - kHebrewOffset;
     }
 };
 
@@ -58,7 +76,81 @@ const ByteTable& byteTable() {
     static const ByteTable table;
     return table;
 }
+
 } // namespace
+
+namespace detail {
+#if defined(__SSE2__)
+// Text is mostly ASCII and Hebrew letters, whose bytes follow from the units
+// by arithmetic: eight units are checked and encoded at once (SSE2 is part of
+// every x86-64). A block holding anything else, or a character the caller
+// rewrites, is encoded as far as its plain prefix and the rest goes unit by
+// unit through the table.
+class BlockEncoder {
+public:
+    explicit BlockEncoder(const TextFileWriter::Rewrite& rewrite) : rewrite_(rewrite) {}
+
+    static constexpr int kUnits = 8;
+
+    // Encodes source[0..8) into out[0..8) when all eight units are plain:
+    // ASCII the caller does not rewrite, or Hebrew letters.
+    bool encodeIfPlain(const char16_t* source, char* out) const {
+        const __m128i units = load(source);
+        if (_mm_movemask_epi8(plainLanes(units)) != 0xFFFF)
+            return false;
+        store(units, out);
+        return true;
+    }
+
+    // Encodes source[0..8) into out[0..8) and returns plainPrefix(source):
+    // the bytes of the plain units are right, those after them are to be
+    // written over.
+    int encode(const char16_t* source, char* out) const {
+        const __m128i units = load(source);
+        store(units, out);
+        const __m128i plain = plainLanes(units);
+        return std::countr_one(static_cast<unsigned>(_mm_movemask_epi8(plain))) / 2;
+    }
+
+private:
+    // The byte of every ASCII unit and letter; garbage for other units.
+    static void store(__m128i units, char* out) {
+        const __m128i letter = letterLanes(units);
+        const __m128i bytes = _mm_sub_epi16(
+            units, _mm_and_si128(letter, _mm_set1_epi16(static_cast<short>(kHebrewOffset))));
+        _mm_storel_epi64(reinterpret_cast<__m128i*>(out), _mm_packus_epi16(bytes, bytes));
+    }
+    static __m128i load(const char16_t* source) {
+        return _mm_loadu_si128(reinterpret_cast<const __m128i*>(source));
+    }
+    // SSE2 compares 16-bit lanes as signed: flipping the top bit makes the
+    // signed order the unsigned one.
+    static __m128i flipped(__m128i units) {
+        return _mm_xor_si128(units, _mm_set1_epi16(static_cast<short>(-0x8000)));
+    }
+    static __m128i letterLanes(__m128i units) {
+        const __m128i fromAlef = _mm_sub_epi16(units, _mm_set1_epi16(static_cast<short>(kAlef)));
+        return _mm_cmplt_epi16(flipped(fromAlef),
+                               _mm_set1_epi16(static_cast<short>(kTav - kAlef + 1 - 0x8000)));
+    }
+    static __m128i lanes(const TextFileWriter::Rewrite::Lanes& l) {
+        return _mm_load_si128(reinterpret_cast<const __m128i*>(l.data()));
+    }
+    __m128i plainLanes(__m128i units) const {
+        const __m128i f = flipped(units);
+        const __m128i ascii = _mm_andnot_si128(_mm_cmplt_epi16(f, lanes(rewrite_.asciiFrom)),
+                                               _mm_cmplt_epi16(f, asciiEnd()));
+        __m128i rewritten = _mm_cmpeq_epi16(units, lanes(rewrite_.listed[0]));
+        for (size_t i = 1; i < rewrite_.listed.size(); ++i)
+            rewritten = _mm_or_si128(rewritten, _mm_cmpeq_epi16(units, lanes(rewrite_.listed[i])));
+        return _mm_andnot_si128(rewritten, _mm_or_si128(ascii, letterLanes(units)));
+    }
+    static __m128i asciiEnd() { return _mm_set1_epi16(static_cast<short>(0x80 - 0x8000)); }
+
+    const TextFileWriter::Rewrite& rewrite_;
+};
+#endif
+} // namespace detail
 
 TextFileWriter::TextFileWriter(const QString& path, Unmappable mode) : path_(path) {
     UErrorCode status = U_ZERO_ERROR;
@@ -87,6 +179,7 @@ TextFileWriter::TextFileWriter(const QString& path, Unmappable mode) : path_(pat
         fail(QStringLiteral("לא ניתן ליצור את הקובץ %1"), errno);
     std::setvbuf(file_, nullptr, _IONBF, 0);
     table_ = byteTable().bytes.data();
+    blocks_ = byteTable().fitsBlocks;
     buffer_ = std::make_unique<char[]>(kBufferBytes);
     cur_ = buffer_.get();
     end_ = cur_ + kBufferBytes;
@@ -119,14 +212,8 @@ void TextFileWriter::fail(const QString& what, int err) {
     throw Failure(what.arg(path_) + QStringLiteral(": ") + systemError(err), err);
 }
 
-void TextFileWriter::requireOpen() const {
-    if (!file_)
-        throw Failure(QStringLiteral("הקובץ %1 כבר נסגר").arg(path_));
-}
-
-void TextFileWriter::makeRoom(size_t bytes) {
-    if (static_cast<size_t>(end_ - cur_) < bytes)
-        flushBuffer();
+void TextFileWriter::failClosed() const {
+    throw Failure(QStringLiteral("הקובץ %1 כבר נסגר").arg(path_));
 }
 
 void TextFileWriter::write(QStringView piece, const Rewrite& rewrite) {
@@ -142,32 +229,76 @@ void TextFileWriter::write(QStringView piece, const Rewrite& rewrite) {
     // and the compiler would reload the members for every unit.
     const std::uint64_t bits = rewrite.bits;
     const unsigned short* const table = table_;
+#if defined(__SSE2__)
+    const detail::BlockEncoder encoder(rewrite);
+    const bool blocks = blocks_;
+#endif
     while (source < end) {
         makeRoom(kMaxBytes * 256);
         const auto room = static_cast<size_t>(end_ - cur_) / kMaxBytes;
         const char16_t* const stop = source + std::min(static_cast<size_t>(end - source), room);
         char* out = cur_;
-        // One byte per unit while the table knows the unit; the rewritten
-        // characters are all ASCII, so the check comes first.
-        for (; source < stop; ++source) {
+        for (;;) {
+#if defined(__SSE2__)
+            // Each unit has room for kMaxBytes, so a block's eight bytes fit.
+            if (blocks && stop - source >= detail::BlockEncoder::kUnits)
+                out = encodeBlocks(encoder, source, stop, out);
+#endif
+            if (source == stop)
+                break;
+            // One unit through the table; the rewritten characters are all
+            // ASCII, so their check comes first.
             const char16_t unit = *source;
             if (unit < 64 && ((bits >> unit) & 1) != 0) {
                 const std::string_view with = rewrite.replacement(unit);
                 if (!with.empty()) // an empty view may have no data pointer at all
                     std::memcpy(out, with.data(), with.size());
                 out += with.size();
+                ++source;
                 continue;
             }
             const unsigned short byte = table[unit];
             if (byte == kNoByte)
                 break;
             *out++ = static_cast<char>(byte);
+            ++source;
         }
         cur_ = out;
         if (source < stop)
             source = convertUnmapped(source, end);
     }
 }
+
+#if defined(__SSE2__)
+// Encodes source..stop (at least one block) into out, block by block, and
+// the units no block takes one by one through the table, up to the first
+// that needs more than the table; returns the end of the bytes and leaves
+// `source` at the first unit not yet encoded.
+char* TextFileWriter::encodeBlocks(const detail::BlockEncoder& encoder, const char16_t*& source,
+                                   const char16_t* stop, char* out) const {
+    const char16_t* const first = source;
+    while (stop - source >= detail::BlockEncoder::kUnits) {
+        const int done = encoder.encode(source, out);
+        source += done;
+        out += done;
+        if (done < detail::BlockEncoder::kUnits)
+            return out; // a unit no block takes: the caller's loop handles it
+    }
+    // Fewer than eight units left: the last eight units of the piece again
+    // when all of them are plain. Plain units come out one byte each
+    // whichever way they go, so the units before `source` that the block
+    // repeats (all taken by blocks since `first`) have the same bytes just
+    // before `out`.
+    const auto left = static_cast<int>(stop - source);
+    const char16_t* const last = stop - detail::BlockEncoder::kUnits;
+    if (left > 0 && last >= first &&
+        encoder.encodeIfPlain(last, out - (detail::BlockEncoder::kUnits - left))) {
+        source = stop;
+        out += left;
+    }
+    return out;
+}
+#endif
 
 void TextFileWriter::writeAscii(std::string_view ascii, const Rewrite& rewrite) {
     requireOpen();

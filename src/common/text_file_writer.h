@@ -2,6 +2,7 @@
 
 #include <QString>
 #include <QStringView>
+#include <array>
 #include <cstdint>
 #include <cstdio>
 #include <cstring>
@@ -11,6 +12,10 @@
 struct UConverter;
 
 namespace ardcard {
+
+namespace detail {
+class BlockEncoder;
+}
 
 // Writes one output file in the windows-1255 code page, every line ended by
 // CR LF; a line may be written in pieces. Opening deletes a file of the same
@@ -40,11 +45,40 @@ public:
     // of ASCII (nothing when empty). Done while encoding, in the same pass.
     struct Rewrite {
         static constexpr size_t kMaxReplacement = 8;
+        // The rewritten characters one by one as well (up to kMaxListed of
+        // them), each repeated in eight lanes, so that the encoder finds all
+        // of them in eight units at once; a longer set makes it take every
+        // unit below 64 singly.
+        static constexpr int kMaxListed = 5;
+        using Lanes = std::array<char16_t, 8>;
+
         std::uint64_t bits = 0;
         std::string_view (*replacement)(char16_t) = nullptr;
+        alignas(16) std::array<Lanes, kMaxListed> listed{}; // unused places hold 0
+        // The first unit that can be plain ASCII (0 or 64), top bit flipped
+        // for the encoder's signed compare.
+        alignas(16) Lanes asciiFrom = lanesOf(0x8000);
+
+        constexpr Rewrite() = default;
+        constexpr Rewrite(std::uint64_t setBits, std::string_view (*with)(char16_t))
+            : bits(setBits), replacement(with) {
+            size_t count = 0;
+            for (int c = 0; c < 64; ++c) {
+                if (((setBits >> c) & 1) == 0)
+                    continue;
+                if (count < listed.size())
+                    listed[count] = lanesOf(static_cast<char16_t>(c));
+                ++count;
+            }
+            if (count > listed.size())
+                asciiFrom = lanesOf(0x8000 + 64);
+        }
+
+    private:
+        static constexpr Lanes lanesOf(char16_t c) { return {c, c, c, c, c, c, c, c}; }
     };
 
-    void write(QStringView piece) { write(piece, Rewrite{}); }
+    void write(QStringView piece);
     void write(QStringView piece, const Rewrite& rewrite);
     // ASCII text (markup, digits): the same bytes in windows-1255, so it
     // skips the encoding step. Every byte must be below 0x80.
@@ -52,7 +86,7 @@ public:
         // Strictly less: a closed writer has no buffer (both null) and must
         // reach the slow path, which reports it.
         if (heldLead_ == 0 && ascii.size() < static_cast<size_t>(end_ - cur_)) {
-            std::memcpy(cur_, ascii.data(), ascii.size());
+            copyBytes(cur_, ascii.data(), ascii.size());
             cur_ += ascii.size();
             return;
         }
@@ -70,13 +104,39 @@ public:
     const QString& path() const { return path_; }
 
 private:
+    // Most pieces are a field or a tag of a few bytes: two overlapping moves
+    // of fixed size copy them without a call to the library's memcpy.
+    static void copyBytes(char* to, const char* from, size_t n) {
+        if (n >= 8 && n <= 16) {
+            std::memcpy(to, from, 8);
+            std::memcpy(to + n - 8, from + n - 8, 8);
+        } else if (n >= 4 && n < 8) {
+            std::memcpy(to, from, 4);
+            std::memcpy(to + n - 4, from + n - 4, 4);
+        } else if (n > 0 && n < 4) {
+            to[0] = from[0];
+            to[n / 2] = from[n / 2];
+            to[n - 1] = from[n - 1];
+        } else if (n > 16) {
+            std::memcpy(to, from, n);
+        }
+    }
     void writeAsciiSlow(std::string_view ascii);
-    void makeRoom(size_t bytes);
+    void makeRoom(size_t bytes) {
+        if (static_cast<size_t>(end_ - cur_) < bytes)
+            flushBuffer();
+    }
+    char* encodeBlocks(const detail::BlockEncoder& encoder, const char16_t*& source,
+                       const char16_t* stop, char* out) const;
     const char16_t* convertUnmapped(const char16_t* source, const char16_t* end);
     void convertWithIcu(const char16_t* source, const char16_t* end);
     void settleHeldLead(const char16_t* next, const char16_t* end, const char16_t** resume);
     void flushBuffer();
-    void requireOpen() const;
+    void requireOpen() const {
+        if (!file_)
+            failClosed();
+    }
+    [[noreturn]] void failClosed() const;
     [[noreturn]] void fail(const QString& what, int err);
 
     QString path_;
@@ -88,6 +148,10 @@ private:
     // windows-1255 byte of each UTF-16 unit, or a mark for the units ICU
     // handles; shared by every writer.
     const unsigned short* table_ = nullptr;
+    // Whether the table agrees with the eight-at-a-time encoding (ASCII as
+    // itself, the Hebrew letters by a fixed offset); it does for every ICU
+    // seen so far, and the writer goes unit by unit otherwise.
+    bool blocks_ = false;
     // Encoded bytes not yet in the file: buffer_[0 .. cur_); end_ is the
     // buffer's end, and both are null once the file is closed.
     std::unique_ptr<char[]> buffer_;
@@ -97,5 +161,12 @@ private:
     // may start the next piece.
     char16_t heldLead_ = 0;
 };
+
+// Nothing rewritten: the plain write().
+inline constexpr TextFileWriter::Rewrite kNoRewrite{};
+
+inline void TextFileWriter::write(QStringView piece) {
+    write(piece, kNoRewrite);
+}
 
 } // namespace ardcard

@@ -4,6 +4,7 @@
 #include "common/text_helpers.h"
 
 #include <algorithm>
+#include <cstring>
 #include <numeric>
 
 namespace ardcard {
@@ -216,6 +217,63 @@ LedgerModel::CellView LedgerModel::cellView(int gridRow, int column, CellScratch
     scratch.text = generalText(r, column);
     view.text = scratch.text;
     return view;
+}
+
+namespace {
+// FormatShortDateTo, through the memo of the column's last date.
+size_t memoizedDateTo(char* out, QDate date, LedgerModel::RowCells::DateMemo& memo) {
+    const qint64 day = date.toJulianDay();
+    if (memo.held && memo.day == day) {
+        std::memcpy(out, memo.text, sizeof memo.text);
+        return sizeof memo.text;
+    }
+    const size_t len = FormatShortDateTo(out, date);
+    memo.held = len == sizeof memo.text;
+    if (memo.held) {
+        memo.day = day;
+        std::memcpy(memo.text, out, sizeof memo.text);
+    }
+    return len;
+}
+} // namespace
+
+void LedgerModel::readRow(int gridRow, int lastColumn, MoneyText money, RowCells& cells) const {
+    lastColumn = std::min(lastColumn, kColumns - 1);
+    if (gridRow < 1 || gridRow > committed_) {
+        for (int c = 0; c <= lastColumn; ++c)
+            cells.cell[c] = CellView();
+        return;
+    }
+    const LedgerRow& r = rows_[static_cast<size_t>(gridRow - 1)];
+    const bool plainMoney = money == MoneyText::Plain;
+    // The formatted cells follow one another in one buffer with room for
+    // the longest text of every column.
+    char* out = cells.ascii;
+    for (int c = 0; c <= lastColumn; ++c) {
+        CellView& view = cells.cell[c];
+        if (const QString* held = heldText(r, c)) {
+            view = CellView();
+            view.text = *held;
+            continue;
+        }
+        size_t len = 0;
+        if (c == 1 || c == 4)
+            len = memoizedDateTo(out, c == 1 ? r.valueDate : r.dueDate, cells.dates[c == 4]);
+        else if (plainMoney && (c == 8 || c == 9 || c == 11))
+            len = FormatMoneyPlainTo(out, c == 8 ? r.amount : c == 9 ? r.foreignAmount : r.balance);
+        else
+            len = formattedTo(out, r, c);
+        view.isAscii = len != 0;
+        if (len != 0) {
+            view.ascii = std::string_view(out, len);
+            view.text = QStringView();
+            out += len;
+        } else {
+            cells.text[c] = generalText(r, c);
+            view.ascii = std::string_view();
+            view.text = cells.text[c];
+        }
+    }
 }
 
 QString LedgerModel::cellText(int gridRow, int column) const {

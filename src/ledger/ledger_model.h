@@ -51,6 +51,27 @@ public:
         QStringView text; // otherwise
     };
     CellView cellView(int gridRow, int column, CellScratch& scratch) const;
+
+    // Cells 0 to lastColumn of one data row at once, for writers that go
+    // through every row: one lookup of the row instead of one per cell, the
+    // same views cellView gives. With MoneyText::Plain the amounts (columns
+    // 8, 9 and 11) come without their thousands commas, so that no ASCII
+    // view holds a ",". The views live until `cells` is reused or the row
+    // changes.
+    enum class MoneyText { Grouped, Plain };
+    struct RowCells {
+        CellView cell[kColumns];
+        char ascii[kColumns * kNumberTextMax];
+        QString text[kColumns]; // the rare general texts
+        // The last date formatted in each date column: rows of one day
+        // follow one another, so most dates are copied, not computed.
+        struct DateMemo {
+            qint64 day = 0;
+            char text[8] = {};
+            bool held = false;
+        } dates[2];
+    };
+    void readRow(int gridRow, int lastColumn, MoneyText money, RowCells& cells) const;
     // The row's details; grid row 0 and the blank row give an empty detail.
     const RowDetail& rowDetail(int gridRow) const;
     const LedgerRow& row(int gridRow) const; // grid rows 1..gridRowCount()-2

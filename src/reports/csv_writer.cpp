@@ -5,27 +5,22 @@
 #include "ledger/ledger_model.h"
 #include "reports/page_markup.h"
 
+#include <memory>
+
 namespace ardcard::reports {
 
 namespace {
 // Grid columns 0 to 12 are exported; the grid's last four stay on screen.
 constexpr int kLastExportedColumn = LedgerModel::kColumns - 5;
 
-// A cell's text without the characters a field may not carry; of those a
-// formatted number can hold only the thousands commas, dropped here in a
-// local copy so that the field goes to the file in one piece.
+// A cell as a field. The ASCII cells are numbers and dates read with plain
+// amounts, so they hold none of the characters a field may not carry and go
+// to the file as they stand; only texts need the stripping pass.
 void writeField(TextFileWriter& file, const LedgerModel::CellView& cell) {
-    if (cell.isAscii) {
-        char field[kNumberTextMax];
-        char* out = field;
-        for (const char c : cell.ascii) {
-            *out = c;
-            out += c != ',' ? 1 : 0;
-        }
-        file.writeAscii(std::string_view(field, static_cast<size_t>(out - field)));
-    } else {
+    if (cell.isAscii)
+        file.writeAscii(cell.ascii);
+    else
         WriteStripped(file, cell.text);
-    }
 }
 
 // The company directory of a row as companyDir() gives it, without a copy
@@ -51,12 +46,14 @@ void WriteCsv(const QString& path, const LedgerModel& ledger, const ModuleState&
     file.endLine();
 
     const int lastDataRow = ledger.gridRowCount() - 2;
-    LedgerModel::CellScratch scratch;
+    // A scratch of some kilobytes, kept off the stack.
+    const auto cells = std::make_unique<LedgerModel::RowCells>();
     for (int r = 1; r <= lastDataRow; ++r) {
-        for (int c = 0; c <= kLastExportedColumn; ++c) {
-            if (c > 0)
-                file.writeAscii(",");
-            writeField(file, ledger.cellView(r, c, scratch));
+        ledger.readRow(r, kLastExportedColumn, LedgerModel::MoneyText::Plain, *cells);
+        writeField(file, cells->cell[0]);
+        for (int c = 1; c <= kLastExportedColumn; ++c) {
+            file.writeAscii(",");
+            writeField(file, cells->cell[c]);
         }
         const RowDetail& detail = ledger.rowDetail(r);
         file.writeAscii(",");

@@ -7,6 +7,7 @@
 #include "reports/page_markup.h"
 
 #include <QDate>
+#include <memory>
 
 namespace ardcard::reports {
 
@@ -114,7 +115,8 @@ void writeRows(TextFileWriter& file, const LedgerModel& ledger, const ModuleStat
     const bool severalCompanies = state.CompanyDirCount > 1;
     int lastCompany = 0;
     const int lastDataRow = ledger.gridRowCount() - 2;
-    LedgerModel::CellScratch scratch;
+    // A scratch of some kilobytes, kept off the stack.
+    const auto cells = std::make_unique<LedgerModel::RowCells>();
     for (int r = 1; r <= lastDataRow; ++r) {
         if (severalCompanies) {
             // Rows of one directory that are not consecutive (after a sort)
@@ -126,9 +128,10 @@ void writeRows(TextFileWriter& file, const LedgerModel& ledger, const ModuleStat
             }
         }
         file.writeAscii(kRowOpenLine);
+        ledger.readRow(r, kLastPrintedColumn, LedgerModel::MoneyText::Grouped, *cells);
         for (int c = kLastPrintedColumn; c >= 0; --c) {
             file.writeAscii(kCellOpen);
-            writeCell(file, ledger.cellView(r, c, scratch));
+            writeCell(file, cells->cell[c]);
             file.writeAscii(kCellClose);
         }
         file.writeAscii(kRowClose);
