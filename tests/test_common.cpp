@@ -68,6 +68,7 @@ private Q_SLOTS:
     void writerAsciiPiecesOfEverySize();
     void writerShortPiecesMatchGeneralPath_data();
     void writerShortPiecesMatchGeneralPath();
+    void integerTextAtEveryLength();
 };
 
 void TestCommon::stripQuotes_data() {
@@ -902,6 +903,28 @@ void TestCommon::writerShortPiecesMatchGeneralPath() {
     const QByteArray written = readAll(fast);
     QVERIFY(written.size() > 1000000); // past the buffer
     QCOMPARE(written, readAll(general));
+}
+
+// Every digit count from 1 to 20, at both ends of each and in between, and
+// random values, against the standard library's own decimal text.
+void TestCommon::integerTextAtEveryLength() {
+    std::vector<unsigned long long> values = {0, 1, 9,
+                                              std::numeric_limits<unsigned long long>::max()};
+    unsigned long long power = 1;
+    for (int k = 1; k <= 19; ++k) {
+        power *= 10;
+        values.insert(values.end(), {power - 1, power, power + 1, power / 2, power * 9 / 10 + 7});
+    }
+    std::mt19937_64 random(29);
+    for (int i = 0; i < 100000; ++i)
+        values.push_back(random() >> (random() % 64));
+    char buf[kNumberTextMax];
+    for (const unsigned long long value : values) {
+        const std::string expected = std::to_string(value);
+        QCOMPARE(std::string(buf, FormatUnsignedTo(buf, value)), expected);
+        const auto signedValue = static_cast<long long>(value);
+        QCOMPARE(std::string(buf, FormatIntegerTo(buf, signedValue)), std::to_string(signedValue));
+    }
 }
 
 #include "test_common.moc"
