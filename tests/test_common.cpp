@@ -66,6 +66,9 @@ private Q_SLOTS:
     void writerBlocksMatchIcuForEveryUnit_data();
     void writerBlocksMatchIcuForEveryUnit();
     void writerAsciiPiecesOfEverySize();
+    void writerShortPiecesMatchGeneralPath_data();
+    void writerShortPiecesMatchGeneralPath();
+    void integerTextAtEveryLength();
 };
 
 void TestCommon::stripQuotes_data() {
@@ -839,4 +842,89 @@ void TestCommon::writerAsciiPiecesOfEverySize() {
 }
 
 QTEST_GUILESS_MAIN(TestCommon)
+void TestCommon::writerShortPiecesMatchGeneralPath_data() {
+    QTest::addColumn<int>("mode");
+    QTest::addColumn<QString>("rewritten");
+    QTest::addColumn<QString>("replacement");
+    QTest::newRow("page, none") << int(TextFileWriter::Unmappable::CharacterReference) << QString()
+                                << QString();
+    QTest::newRow("csv, separators dropped")
+        << int(TextFileWriter::Unmappable::QuestionMark) << QStringLiteral("\",'") << QString();
+    QTest::newRow("page, markup") << int(TextFileWriter::Unmappable::CharacterReference)
+                                  << QStringLiteral("&<>\"'") << QStringLiteral("&#12345;");
+    QTest::newRow("page, digits and space") << int(TextFileWriter::Unmappable::CharacterReference)
+                                            << QStringLiteral("0123456789 ") << QStringLiteral("#");
+}
+
+// Pieces of 0 to 20 units (either side of the short-piece limit), drawn from
+// plain text, rewritten characters, the letters' neighbours, characters the
+// code page holds elsewhere or not at all, and surrogate halves, written
+// once by write() and once by the general path alone: the same bytes.
+void TestCommon::writerShortPiecesMatchGeneralPath() {
+    QFETCH(int, mode);
+    QFETCH(QString, rewritten);
+    QFETCH(QString, replacement);
+    const auto unmappable = static_cast<TextFileWriter::Unmappable>(mode);
+    static QByteArray toBytes; // the replacement function has no state of its own
+    toBytes = replacement.toLatin1();
+    std::uint64_t bits = 0;
+    for (const QChar c : rewritten)
+        bits |= std::uint64_t{1} << c.unicode();
+    const TextFileWriter::Rewrite rewrite(bits, [](char16_t) {
+        return std::string_view(toBytes.constData(), static_cast<size_t>(toBytes.size()));
+    });
+    const char16_t alphabet[] = {u'a',   u'Z',   u'0',   u'9',   u' ',   u'~',   0x7F,
+                                 u'"',   u'\'',  u',',   u'&',   u'<',   u'>',   u'#',
+                                 0x05D0, 0x05D1, 0x05E9, 0x05EA, 0x05CF, 0x05EB, 0x05B0,
+                                 0x20AA, 0x00E9, 0x0635, 0x0080, 0xD83D, 0xDE00, 0xFFFD};
+    const auto letters = std::size(alphabet);
+    std::mt19937 random(17);
+    QTemporaryDir dir;
+    const QString fast = dir.filePath(QStringLiteral("fast.txt"));
+    const QString general = dir.filePath(QStringLiteral("general.txt"));
+    {
+        TextFileWriter a(fast, unmappable);
+        TextFileWriter b(general, unmappable);
+        for (int i = 0; i < 200000; ++i) {
+            QString piece;
+            const auto length = random() % 21;
+            // Most pieces plain, so that the short path takes many of them.
+            const bool plainOnly = random() % 3 != 0;
+            for (unsigned k = 0; k < length; ++k) {
+                const auto pick = random() % (plainOnly ? 16 : letters);
+                piece += QChar(alphabet[pick]);
+            }
+            a.write(piece, rewrite);
+            b.writeGeneral(piece, rewrite);
+        }
+        a.close();
+        b.close();
+    }
+    const QByteArray written = readAll(fast);
+    QVERIFY(written.size() > 1000000); // past the buffer
+    QCOMPARE(written, readAll(general));
+}
+
+// Every digit count from 1 to 20, at both ends of each and in between, and
+// random values, against the standard library's own decimal text.
+void TestCommon::integerTextAtEveryLength() {
+    std::vector<unsigned long long> values = {0, 1, 9,
+                                              std::numeric_limits<unsigned long long>::max()};
+    unsigned long long power = 1;
+    for (int k = 1; k <= 19; ++k) {
+        power *= 10;
+        values.insert(values.end(), {power - 1, power, power + 1, power / 2, power * 9 / 10 + 7});
+    }
+    std::mt19937_64 random(29);
+    for (int i = 0; i < 100000; ++i)
+        values.push_back(random() >> (random() % 64));
+    char buf[kNumberTextMax];
+    for (const unsigned long long value : values) {
+        const std::string expected = std::to_string(value);
+        QCOMPARE(std::string(buf, FormatUnsignedTo(buf, value)), expected);
+        const auto signedValue = static_cast<long long>(value);
+        QCOMPARE(std::string(buf, FormatIntegerTo(buf, signedValue)), std::to_string(signedValue));
+    }
+}
+
 #include "test_common.moc"

@@ -67,6 +67,22 @@ char* digitsBackwards(char* end, unsigned long long n) {
     return end;
 }
 
+// How many digits n has, so that they can be written in place from the
+// end without a scratch and a copy: the bit length gives the count or one
+// more (1233 / 4096 is just below log10 2), and one compare settles it.
+size_t decimalLength(unsigned long long n) {
+    static constexpr auto kPowers = [] {
+        std::array<unsigned long long, 20> p{};
+        p[0] = 1;
+        for (size_t k = 1; k < p.size(); ++k)
+            p[k] = p[k - 1] * 10;
+        return p;
+    }();
+    const unsigned long long m = n | 1; // 0 has one digit, as 1 has
+    const auto guess = static_cast<size_t>(std::bit_width(m) * 1233) >> 12; // at most 19
+    return guess + 1 - (m < kPowers[guess] ? 1 : 0);
+}
+
 // The grouped text of `scaled` (the value times 10^decimals) at the end of
 // a buffer; returns where it starts. The integer part gets at least one
 // digit: 0.05 is "0.05", not ".05".
@@ -246,17 +262,18 @@ std::size_t FormatMoneyPlainTo(char* out, double value) {
         char* const end = std::remove(out, out + len, ',');
         return static_cast<size_t>(end - out);
     }
-    char buf[24]; // 20 digits, sign and point
-    char* const end = buf + sizeof buf;
+    // Sign, whole units, point and cents, written in place.
+    const bool negative = value < 0 && scaled != 0;
+    const std::uint64_t units = scaled / 100;
     const auto cents = static_cast<size_t>(scaled % 100) * 2;
-    char* first = digitsBackwards(end - 3, scaled / 100);
+    const size_t len = (negative ? 1 : 0) + decimalLength(units) + 3;
+    char* const end = out + len;
+    digitsBackwards(end - 3, units);
     end[-3] = '.';
     end[-2] = kDigitPairs[cents];
     end[-1] = kDigitPairs[cents + 1];
-    if (value < 0 && scaled != 0)
-        *--first = '-';
-    const auto len = static_cast<size_t>(end - first);
-    std::memcpy(out, first, len);
+    if (negative)
+        *out = '-';
     return len;
 }
 
@@ -292,11 +309,8 @@ std::size_t FormatIntegerTo(char* out, long long value) {
 }
 
 std::size_t FormatUnsignedTo(char* out, unsigned long long value) {
-    char buf[24];
-    char* const end = buf + sizeof buf;
-    const char* first = digitsBackwards(end, value);
-    const auto len = static_cast<size_t>(end - first);
-    std::memcpy(out, first, len);
+    const size_t len = decimalLength(value);
+    digitsBackwards(out + len, value);
     return len;
 }
 

@@ -35,10 +35,9 @@ QString systemError(int err) {
 // otherwise spend a quarter of its time in the converter's generic path.
 constexpr unsigned short kNoByte = 0x100;
 
-// The Hebrew letters alef to tav, which windows-1255 holds at 0xE0 to 0xFA.
-constexpr char16_t kAlef = 0x05D0;
-constexpr char16_t kTav = 0x05EA;
-constexpr unsigned kHebrewOffset = kAlef - 0xE0;
+constexpr char16_t kAlef = TextFileWriter::kAlef;
+constexpr char16_t kTav = TextFileWriter::kTav;
+constexpr unsigned kHebrewOffset = TextFileWriter::kHebrewOffset;
 
 struct ByteTable {
     std::array<unsigned short, 0x10000> bytes{};
@@ -216,7 +215,7 @@ void TextFileWriter::failClosed() const {
     throw Failure(QStringLiteral("הקובץ %1 כבר נסגר").arg(path_));
 }
 
-void TextFileWriter::write(QStringView piece, const Rewrite& rewrite) {
+void TextFileWriter::writeGeneral(QStringView piece, const Rewrite& rewrite) {
     requireOpen();
     const auto* source = reinterpret_cast<const char16_t*>(piece.utf16());
     const char16_t* const end = source + piece.size();

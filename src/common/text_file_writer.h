@@ -79,7 +79,15 @@ public:
     };
 
     void write(QStringView piece);
-    void write(QStringView piece, const Rewrite& rewrite);
+    void write(QStringView piece, const Rewrite& rewrite) {
+        if (piece.size() <= kShortPiece && encodeShort(piece, rewrite))
+            return;
+        writeGeneral(piece, rewrite);
+    }
+    // The same bytes as write(), always by the general encoder (blocks of
+    // eight units, the table, ICU); write() takes it for all but short
+    // pieces of plain text.
+    void writeGeneral(QStringView piece, const Rewrite& rewrite);
     // ASCII text (markup, digits): the same bytes in windows-1255, so it
     // skips the encoding step. Every byte must be below 0x80.
     void writeAscii(std::string_view ascii) {
@@ -103,7 +111,48 @@ public:
 
     const QString& path() const { return path_; }
 
+    // The Hebrew letters alef to tav, which windows-1255 holds at 0xE0 to
+    // 0xFA: a fixed offset.
+    static constexpr char16_t kAlef = 0x05D0;
+    static constexpr char16_t kTav = 0x05EA;
+    static constexpr unsigned kHebrewOffset = kAlef - 0xE0;
+    // Pieces up to this length may take encodeShort().
+    static constexpr qsizetype kShortPiece = 16;
+
 private:
+    // Most pieces of text are a field of a few characters, ASCII and Hebrew
+    // letters, whose bytes follow by arithmetic: encoding them unit by unit
+    // here skips the general path's setup, which costs more than such a
+    // piece itself. All or nothing: on the first unit it does not take
+    // (any other character, a held surrogate half, too little room, a table
+    // that does not fit the arithmetic) it writes nothing and returns false,
+    // and the general path starts the piece afresh.
+    bool encodeShort(QStringView piece, const Rewrite& rewrite) {
+        const auto n = static_cast<size_t>(piece.size());
+        // Strictly less, as in writeAscii: a closed writer has no room.
+        if (heldLead_ != 0 || !blocks_ ||
+            n * Rewrite::kMaxReplacement >= static_cast<size_t>(end_ - cur_))
+            return false;
+        const auto* source = reinterpret_cast<const char16_t*>(piece.utf16());
+        const std::uint64_t bits = rewrite.bits; // a local: `out` may alias anything
+        char* out = cur_;
+        for (size_t i = 0; i < n; ++i) {
+            const char16_t unit = source[i];
+            if (unit < 64 && ((bits >> unit) & 1) != 0) {
+                const std::string_view with = rewrite.replacement(unit);
+                copyBytes(out, with.data(), with.size());
+                out += with.size();
+            } else if (unit < 0x80) {
+                *out++ = static_cast<char>(unit);
+            } else if (unit >= kAlef && unit <= kTav) {
+                *out++ = static_cast<char>(unit - kHebrewOffset);
+            } else {
+                return false;
+            }
+        }
+        cur_ = out;
+        return true;
+    }
     // Most pieces are a field or a tag of a few bytes: two overlapping moves
     // of fixed size copy them without a call to the library's memcpy.
     static void copyBytes(char* to, const char* from, size_t n) {
