@@ -6,6 +6,20 @@ void PeriodTotals::clear() {
     weeks_.clear();
     months_.clear();
     quarters_.clear();
+    last_ = YearCells();
+}
+
+PeriodTotals::YearCells& PeriodTotals::cellsOf(int year) {
+    if (last_.weeks && last_.year == year)
+        return last_;
+    const QDate first(year, 1, 1);
+    last_.year = year;
+    last_.firstDay = first.toJulianDay();
+    last_.firstWeekday = first.dayOfWeek() % 7;
+    last_.weeks = weeks_[year].data();
+    last_.months = months_[year].data();
+    last_.quarters = quarters_[year].data();
+    return last_;
 }
 
 int PeriodTotals::weekOfYear(QDate date) {
@@ -15,10 +29,14 @@ int PeriodTotals::weekOfYear(QDate date) {
 }
 
 void PeriodTotals::add(QDate date, double amount) {
-    const int year = date.year();
-    weeks_[year][weekOfYear(date)] += amount;
-    months_[year][date.month()] += amount;
-    quarters_[year][(date.month() - 1) / 3 + 1] += amount;
+    int year = 0;
+    int month = 0;
+    date.getDate(&year, &month, nullptr);
+    YearCells& cells = cellsOf(year);
+    const qint64 dayOfYear = date.toJulianDay() - cells.firstDay + 1;
+    cells.weeks[(dayOfYear - 1 + cells.firstWeekday) / 7 + 1] += amount;
+    cells.months[month] += amount;
+    cells.quarters[(month - 1) / 3 + 1] += amount;
 }
 
 int PeriodTotals::periodsPerYear(int kind) {

@@ -26,9 +26,21 @@ public:
     std::vector<int> yearsDescending(int kind) const;
 
 private:
+    // The cells of one year; a fetch adds line after line of the same year.
+    struct YearCells {
+        int year = 0;
+        qint64 firstDay = 0;     // Julian day of 1 January
+        int firstWeekday = 0;    // Sunday 0 .. Saturday 6
+        double* weeks = nullptr; // index 1..54
+        double* months = nullptr;
+        double* quarters = nullptr;
+    };
+    YearCells& cellsOf(int year);
+
     std::map<int, std::array<double, 55>> weeks_;   // index 1..54
     std::map<int, std::array<double, 13>> months_;  // index 1..12
     std::map<int, std::array<double, 5>> quarters_; // index 1..4
+    YearCells last_; // map entries never move, so their addresses stay valid
 };
 
 } // namespace ardcard

@@ -111,6 +111,7 @@ void Recordset::exec(Connection& connection, const QString& sql) {
         throw failure;
     }
     dateColumn_.assign(static_cast<size_t>(query_->record().count()), false);
+    lastDate_.assign(dateColumn_.size(), LastDate{});
     if (connection.isSqlite()) {
         const QVariant handle = query_->result()->handle();
         if (handle.isValid() && qstrcmp(handle.typeName(), "sqlite3_stmt*") == 0) {
@@ -136,6 +137,7 @@ void Recordset::Close() {
     query_.reset();
     own_.reset();
     dateColumn_.clear();
+    lastDate_.clear();
     onRow_ = false;
     position_ = 0;
 }
@@ -168,9 +170,16 @@ QVariant Recordset::value(int index) const {
         throw Failure(QStringLiteral("השדה המבוקש אינו קיים"));
     QVariant v = query_->value(index);
     if (dateColumn_[static_cast<size_t>(index)] && v.typeId() == QMetaType::QString) {
+        LastDate& last = lastDate_[static_cast<size_t>(index)];
+        const QString& text = *static_cast<const QString*>(v.constData());
+        if (text == last.text && last.date.isValid())
+            return last.date;
         const QDate date = ToDate(v);
-        if (date.isValid())
-            return date;
+        if (date.isValid()) {
+            last.text = text;
+            last.date = date;
+            return last.date;
+        }
     }
     return v;
 }

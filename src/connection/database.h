@@ -80,6 +80,13 @@ private:
     std::unique_ptr<Connection> own_;
     std::optional<QSqlQuery> query_;
     std::vector<bool> dateColumn_;
+    // The last ISO text read from each date column and its date: consecutive
+    // rows mostly carry the same day.
+    struct LastDate {
+        QString text;
+        QVariant date;
+    };
+    mutable std::vector<LastDate> lastDate_;
     QString sql_;
     qint64 position_ = 0;
     bool onRow_ = false;

@@ -11,6 +11,7 @@
 #include <QSet>
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 namespace ardcard {
 
@@ -30,16 +31,23 @@ class StringPool {
 public:
     explicit StringPool(qsizetype limit) : limit_(limit) {}
     QString intern(const QString& text) {
+        // Consecutive lines mostly repeat the code of the line before.
+        if (text == last_)
+            return last_;
         const auto it = pool_.constFind(text);
-        if (it != pool_.cend())
-            return *it;
+        if (it != pool_.cend()) {
+            last_ = *it;
+            return last_;
+        }
         if (pool_.size() < limit_)
             pool_.insert(text);
+        last_ = text;
         return text;
     }
 
 private:
     QSet<QString> pool_;
+    QString last_;
     qsizetype limit_;
 };
 
@@ -106,6 +114,12 @@ public:
         return d;
     }
     double number(const QVariant& v, const char16_t* name) const {
+        // The drivers hand numbers over as doubles or 64-bit integers; those
+        // are read directly, without a general conversion per value.
+        if (v.typeId() == QMetaType::Double)
+            return *static_cast<const double*>(v.constData());
+        if (v.typeId() == QMetaType::LongLong)
+            return static_cast<double>(*static_cast<const qlonglong*>(v.constData()));
         bool ok = false;
         const double d = v.toDouble(&ok);
         if (!ok)
@@ -122,8 +136,14 @@ public:
         return v.isNull() ? 0.0 : number(v, name);
     }
     int integer(int column, const char16_t* name) const {
+        const QVariant v = required(column, name);
+        if (v.typeId() == QMetaType::LongLong) {
+            const qlonglong n = *static_cast<const qlonglong*>(v.constData());
+            if (n >= std::numeric_limits<int>::min() && n <= std::numeric_limits<int>::max())
+                return static_cast<int>(n);
+        }
         bool ok = false;
-        const int i = required(column, name).toInt(&ok);
+        const int i = v.toInt(&ok);
         if (!ok)
             throw Failure(where() + QStringLiteral("השדה ") + QString::fromUtf16(name) +
                           QStringLiteral(" אינו מספר שלם"));
