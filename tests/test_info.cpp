@@ -165,9 +165,7 @@ private:
     QString connString(const QString& file) const {
         return BuildConnString(dataDir_.path(), QString(), QString(), file, 4);
     }
-    QString tempFile(const QString& name) const {
-        return tmpDir_.path() + u'/' + name;
-    }
+    QString tempFile(const QString& name) const { return tmpDir_.path() + u'/' + name; }
 
     QTemporaryDir tmpDir_;
     QTemporaryDir dataDir_;

@@ -105,7 +105,8 @@ void IniFile::write(const QString& section, const QString& key, const QString& v
     bool ok = false;
     QStringList lines = readLines(path_, &ok);
     if (!ok)
-        throw Failure(QStringLiteral("לא ניתן לשמור את ההגדרות בקובץ %1: לא ניתן לקרוא אותו").arg(path_));
+        throw Failure(
+            QStringLiteral("לא ניתן לשמור את ההגדרות בקובץ %1: לא ניתן לקרוא אותו").arg(path_));
 
     const QString newLine = key + u'=' + quoteIfNeeded(value);
     qsizetype sectionStart = -1;
