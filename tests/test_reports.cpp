@@ -32,6 +32,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 #include <memory>
+#include <random>
 #include <unicode/ucnv.h>
 
 using namespace ardcard;
@@ -223,6 +224,7 @@ private Q_SLOTS:
     void csv();
     void csvPage();
     void rowReadMatchesCellByCell();
+    void csvRowsMatchCellByCell();
 
     void graph_data();
     void graph();
@@ -689,6 +691,117 @@ void TestReports::rowReadMatchesCellByCell() {
     // Outside the data rows every cell is empty.
     ledger.readRow(0, 12, LedgerModel::MoneyText::Plain, plain);
     QVERIFY(!plain.cell[3].isAscii && plain.cell[3].text.isEmpty());
+}
+
+namespace {
+// A text of up to 12 characters from ASCII letters, Hebrew letters, spaces
+// and the separators a CSV field drops.
+QString randomText(std::mt19937& random) {
+    static const char16_t kAlphabet[] = u"aZ9 .-,'\"אבגשת";
+    QString text;
+    const auto length = random() % 13;
+    for (unsigned i = 0; i < length; ++i)
+        text += QChar(kAlphabet[random() % (std::size(kAlphabet) - 1)]);
+    return text;
+}
+
+double randomAmount(std::mt19937& random) {
+    switch (random() % 6) {
+    case 0:
+        return 0;
+    case 1:
+        return -static_cast<double>(random() % 100000) / 100.0;
+    case 2:
+        return static_cast<double>(random()) * 1234.5678; // beyond 1e7 often
+    case 3:
+        return -1e15 - static_cast<double>(random() % 1000); // beyond the fast range
+    default:
+        return static_cast<double>(random() % 10000000) / 1000.0; // halves and thirds
+    }
+}
+
+// Mostly rows of plain typed values, some with a value only the general
+// conversion formats.
+LedgerRow randomRow(std::mt19937& random, int number) {
+    LedgerRow r;
+    r.rowNumber = number % 7 == 0 ? -number : number;
+    r.valueDate = QDate(2024, 1, 1).addDays(number / 5);
+    r.dueDate = QDate(1990, 6, 1).addDays(static_cast<qint64>(random() % 20000));
+    r.batchNo = static_cast<int>(random() % 5000);
+    r.transId = static_cast<qlonglong>(random());
+    r.referance = static_cast<double>(random() % 100000);
+    r.ref2 = -static_cast<double>(random() % 1000);
+    switch (random() % 12) {
+    case 0:
+        r.batchNo = QStringLiteral("B,7'");
+        break;
+    case 1:
+        r.transId = 12.5;
+        break;
+    case 2:
+        r.referance = 1.25;
+        break;
+    case 3:
+        r.ref2 = 1e16;
+        break;
+    case 4:
+        r.valueDate = QDate(999, 12, 31);
+        break;
+    case 5:
+        r.dueDate = QDate();
+        break;
+    case 6:
+        r.batchNo = QVariant();
+        break;
+    case 7:
+        r.transId = 7u;
+        break;
+    default:
+        break;
+    }
+    r.description = randomText(random);
+    r.amount = randomAmount(random);
+    r.foreignAmount = randomAmount(random);
+    r.currencyCode = randomText(random);
+    r.balance = randomAmount(random);
+    r.costCode = randomText(random);
+    r.detail = detail(static_cast<int>(random() % 3), randomText(random), randomText(random));
+    return r;
+}
+} // namespace
+
+void TestReports::csvRowsMatchCellByCell() {
+    // Random rows, enough of them that the writer's buffer fills and goes
+    // to the file several times in the middle of rows: every line is the
+    // grid's own cell texts without the separators a field may not carry.
+    ModuleState& state = moduleState();
+    setCompanies(state, {QStringLiteral("C:\\Ardeco\\A,B"), QStringLiteral("D:\\שנה")});
+    LedgerModel ledger;
+    std::mt19937 random(41);
+    for (int i = 1; i <= 40000; ++i)
+        ledger.stage(randomRow(random, i));
+    ledger.commitStaged();
+
+    const QString path = OutputPath(kCsvFile);
+    WriteCsv(path, ledger, state, true);
+    const QStringList lines = actualText(path).split(QStringLiteral("\r\n"));
+    QCOMPARE(lines.size(), ledger.dataRowCount() + 2); // header, rows, and the last line end
+    auto stripped = [](QString text) {
+        text.remove(u'"');
+        text.remove(u'\'');
+        text.remove(u',');
+        return text;
+    };
+    for (int r = 1; r <= ledger.dataRowCount(); ++r) {
+        QStringList fields;
+        for (int c = 0; c <= 12; ++c)
+            fields << stripped(ledger.cellText(r, c));
+        const RowDetail& d = ledger.rowDetail(r);
+        fields << stripped(d.CounterKey) << stripped(d.CounterName)
+               << stripped(state.CompanyDirList.at(d.CompIndex));
+        QCOMPARE(lines.at(r), fields.join(u','));
+    }
+    QVERIFY(lines.last().isEmpty());
 }
 
 QTEST_MAIN(TestReports)

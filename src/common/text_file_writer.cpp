@@ -339,6 +339,13 @@ void TextFileWriter::writeAsciiSlow(std::string_view ascii) {
     }
 }
 
+void TextFileWriter::makeAsciiRoom(size_t most) {
+    requireOpen();
+    settleHeldLead(nullptr, nullptr, nullptr);
+    if (most >= static_cast<size_t>(end_ - cur_))
+        flushBuffer();
+}
+
 // A stretch the table cannot map (unmappable characters, surrogates) goes
 // through ICU with the writer's own callback; returns where the stretch ends.
 const char16_t* TextFileWriter::convertUnmapped(const char16_t* source, const char16_t* end) {

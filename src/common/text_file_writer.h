@@ -101,6 +101,18 @@ public:
         writeAsciiSlow(ascii);
     }
     void writeAscii(std::string_view ascii, const Rewrite& rewrite);
+    // Room for up to `most` bytes of ASCII written in place, for a caller
+    // that formats numbers straight into the file's buffer rather than into
+    // a scratch of its own first; it hands the end of what it wrote to
+    // commitAscii() before any other write. Every byte must be below 0x80,
+    // and `most` far below the buffer's size (some kilobytes at most).
+    char* asciiRoom(size_t most) {
+        // Strictly less, as in writeAscii: a closed writer has no room.
+        if (heldLead_ != 0 || most >= static_cast<size_t>(end_ - cur_))
+            makeAsciiRoom(most);
+        return cur_;
+    }
+    void commitAscii(char* end) { cur_ = end; }
     void endLine() { writeAscii("\r\n"); }
     void writeLine(QStringView line) {
         write(line);
@@ -171,6 +183,7 @@ private:
         }
     }
     void writeAsciiSlow(std::string_view ascii);
+    void makeAsciiRoom(size_t most);
     void makeRoom(size_t bytes) {
         if (static_cast<size_t>(end_ - cur_) < bytes)
             flushBuffer();

@@ -114,26 +114,6 @@ const QString* heldText(const LedgerRow& r, int column) {
     }
 }
 
-// A batch or transaction number held as an integer, as QVariant::toString
-// would give it; 0 for anything else (text, a double, Null), which keeps
-// Qt's own conversion.
-size_t variantIntegerTo(char* out, const QVariant& value) {
-    if (value.isNull())
-        return 0;
-    switch (value.typeId()) {
-    case QMetaType::Int:
-        return FormatIntegerTo(out, *static_cast<const int*>(value.constData()));
-    case QMetaType::LongLong:
-        return FormatIntegerTo(out, *static_cast<const qlonglong*>(value.constData()));
-    case QMetaType::UInt:
-        return FormatUnsignedTo(out, *static_cast<const uint*>(value.constData()));
-    case QMetaType::ULongLong:
-        return FormatUnsignedTo(out, *static_cast<const qulonglong*>(value.constData()));
-    default:
-        return 0;
-    }
-}
-
 // The ASCII text of a formatted column into `out`, or 0 when the value
 // needs the general conversion (generalText). Never 0 for a real text: every
 // formatted cell has at least one character.
@@ -144,9 +124,9 @@ size_t formattedTo(char* out, const LedgerRow& r, int column) {
     case 1:
         return FormatShortDateTo(out, r.valueDate);
     case 2:
-        return variantIntegerTo(out, r.batchNo);
+        return FormatVariantIntegerTo(out, r.batchNo);
     case 3:
-        return variantIntegerTo(out, r.transId);
+        return FormatVariantIntegerTo(out, r.transId);
     case 4:
         return FormatShortDateTo(out, r.dueDate);
     case 5:
