@@ -873,10 +873,10 @@ void TestCommon::writerShortPiecesMatchGeneralPath() {
     const TextFileWriter::Rewrite rewrite(bits, [](char16_t) {
         return std::string_view(toBytes.constData(), static_cast<size_t>(toBytes.size()));
     });
-    const char16_t alphabet[] = {u'a',   u'Z',   u'0',   u'9',   u' ',   u'~',   0x7F,
-                                 u'"',   u'\'',  u',',   u'&',   u'<',   u'>',   u'#',
-                                 0x05D0, 0x05D1, 0x05E9, 0x05EA, 0x05CF, 0x05EB, 0x05B0,
-                                 0x20AA, 0x00E9, 0x0635, 0x0080, 0xD83D, 0xDE00, 0xFFFD};
+    const char16_t alphabet[] = {u'a',   u'Z',   u'0',   u'9',   u' ',   u'~',   0x7F,   u'"',
+                                 u'\'',  u',',   u'&',   u'<',   u'>',   u'#',   0x05D0, 0x05D1,
+                                 0x05E9, 0x05EA, 0x05CF, 0x05EB, 0x05B0, 0x20AA, 0x00E9, 0x0635,
+                                 0x0080, 0xD83D, 0xDE00, 0xFFFD, 0x0000};
     const auto letters = std::size(alphabet);
     std::mt19937 random(17);
     QTemporaryDir dir;
@@ -896,6 +896,19 @@ void TestCommon::writerShortPiecesMatchGeneralPath() {
             }
             a.write(piece, rewrite);
             b.writeGeneral(piece, rewrite);
+        }
+        // Every character at every place of a plain piece of every short
+        // length: the overlapping blocks see it once or twice.
+        for (int length = 1; length <= 17; ++length) {
+            for (int at = 0; at < length; ++at) {
+                for (const char16_t c : alphabet) {
+                    QString piece;
+                    for (int k = 0; k < length; ++k)
+                        piece += QChar(k == at ? c : alphabet[k % 2 == 0 ? 0 : 16]);
+                    a.write(piece, rewrite);
+                    b.writeGeneral(piece, rewrite);
+                }
+            }
         }
         a.close();
         b.close();

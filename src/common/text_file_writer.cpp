@@ -13,10 +13,6 @@
 #include <unicode/ucnv_err.h>
 #include <unicode/utf16.h>
 
-#if defined(__SSE2__)
-#include <emmintrin.h>
-#endif
-
 namespace ardcard {
 
 namespace {
@@ -77,79 +73,6 @@ const ByteTable& byteTable() {
 }
 
 } // namespace
-
-namespace detail {
-#if defined(__SSE2__)
-// Text is mostly ASCII and Hebrew letters, whose bytes follow from the units
-// by arithmetic: eight units are checked and encoded at once (SSE2 is part of
-// every x86-64). A block holding anything else, or a character the caller
-// rewrites, is encoded as far as its plain prefix and the rest goes unit by
-// unit through the table.
-class BlockEncoder {
-public:
-    explicit BlockEncoder(const TextFileWriter::Rewrite& rewrite) : rewrite_(rewrite) {}
-
-    static constexpr int kUnits = 8;
-
-    // Encodes source[0..8) into out[0..8) when all eight units are plain:
-    // ASCII the caller does not rewrite, or Hebrew letters.
-    bool encodeIfPlain(const char16_t* source, char* out) const {
-        const __m128i units = load(source);
-        if (_mm_movemask_epi8(plainLanes(units)) != 0xFFFF)
-            return false;
-        store(units, out);
-        return true;
-    }
-
-    // Encodes source[0..8) into out[0..8) and returns plainPrefix(source):
-    // the bytes of the plain units are right, those after them are to be
-    // written over.
-    int encode(const char16_t* source, char* out) const {
-        const __m128i units = load(source);
-        store(units, out);
-        const __m128i plain = plainLanes(units);
-        return std::countr_one(static_cast<unsigned>(_mm_movemask_epi8(plain))) / 2;
-    }
-
-private:
-    // The byte of every ASCII unit and letter; garbage for other units.
-    static void store(__m128i units, char* out) {
-        const __m128i letter = letterLanes(units);
-        const __m128i bytes = _mm_sub_epi16(
-            units, _mm_and_si128(letter, _mm_set1_epi16(static_cast<short>(kHebrewOffset))));
-        _mm_storel_epi64(reinterpret_cast<__m128i*>(out), _mm_packus_epi16(bytes, bytes));
-    }
-    static __m128i load(const char16_t* source) {
-        return _mm_loadu_si128(reinterpret_cast<const __m128i*>(source));
-    }
-    // SSE2 compares 16-bit lanes as signed: flipping the top bit makes the
-    // signed order the unsigned one.
-    static __m128i flipped(__m128i units) {
-        return _mm_xor_si128(units, _mm_set1_epi16(static_cast<short>(-0x8000)));
-    }
-    static __m128i letterLanes(__m128i units) {
-        const __m128i fromAlef = _mm_sub_epi16(units, _mm_set1_epi16(static_cast<short>(kAlef)));
-        return _mm_cmplt_epi16(flipped(fromAlef),
-                               _mm_set1_epi16(static_cast<short>(kTav - kAlef + 1 - 0x8000)));
-    }
-    static __m128i lanes(const TextFileWriter::Rewrite::Lanes& l) {
-        return _mm_load_si128(reinterpret_cast<const __m128i*>(l.data()));
-    }
-    __m128i plainLanes(__m128i units) const {
-        const __m128i f = flipped(units);
-        const __m128i ascii = _mm_andnot_si128(_mm_cmplt_epi16(f, lanes(rewrite_.asciiFrom)),
-                                               _mm_cmplt_epi16(f, asciiEnd()));
-        __m128i rewritten = _mm_cmpeq_epi16(units, lanes(rewrite_.listed[0]));
-        for (size_t i = 1; i < rewrite_.listed.size(); ++i)
-            rewritten = _mm_or_si128(rewritten, _mm_cmpeq_epi16(units, lanes(rewrite_.listed[i])));
-        return _mm_andnot_si128(rewritten, _mm_or_si128(ascii, letterLanes(units)));
-    }
-    static __m128i asciiEnd() { return _mm_set1_epi16(static_cast<short>(0x80 - 0x8000)); }
-
-    const TextFileWriter::Rewrite& rewrite_;
-};
-#endif
-} // namespace detail
 
 TextFileWriter::TextFileWriter(const QString& path, Unmappable mode) : path_(path) {
     UErrorCode status = U_ZERO_ERROR;

@@ -3,11 +3,16 @@
 #include <QString>
 #include <QStringView>
 #include <array>
+#include <bit>
 #include <cstdint>
 #include <cstdio>
 #include <cstring>
 #include <memory>
 #include <string_view>
+
+#if defined(__SSE2__)
+#include <emmintrin.h>
+#endif
 
 struct UConverter;
 
@@ -146,6 +151,10 @@ private:
             n * Rewrite::kMaxReplacement >= static_cast<size_t>(end_ - cur_))
             return false;
         const auto* source = reinterpret_cast<const char16_t*>(piece.utf16());
+        if (n >= 4 && encodeShortBlocks(source, n, rewrite, cur_)) {
+            cur_ += n;
+            return true;
+        }
         const std::uint64_t bits = rewrite.bits; // a local: `out` may alias anything
         char* out = cur_;
         for (size_t i = 0; i < n; ++i) {
@@ -165,6 +174,13 @@ private:
         cur_ = out;
         return true;
     }
+    // A piece of 4 to 16 units that is all plain (ASCII not rewritten,
+    // Hebrew letters), as two overlapping blocks of eight or four units
+    // that stay inside the piece: each unit's byte lands in its own place,
+    // whichever block writes it last. False when a unit is not plain; the
+    // caller then goes unit by unit over what was written here.
+    static bool encodeShortBlocks(const char16_t* source, size_t n, const Rewrite& rewrite,
+                                  char* out);
     // Most pieces are a field or a tag of a few bytes: two overlapping moves
     // of fixed size copy them without a call to the library's memcpy.
     static void copyBytes(char* to, const char* from, size_t n) {
@@ -224,8 +240,113 @@ private:
     char16_t heldLead_ = 0;
 };
 
+namespace detail {
+#if defined(__SSE2__)
+// Text is mostly ASCII and Hebrew letters, whose bytes follow from the units
+// by arithmetic: eight units are checked and encoded at once (SSE2 is part of
+// every x86-64). A block holding anything else, or a character the caller
+// rewrites, is encoded as far as its plain prefix and the rest goes unit by
+// unit through the table.
+class BlockEncoder {
+public:
+    explicit BlockEncoder(const TextFileWriter::Rewrite& rewrite) : rewrite_(rewrite) {}
+
+    static constexpr int kUnits = 8;
+
+    // Encodes source[0..8) into out[0..8) when all eight units are plain:
+    // ASCII the caller does not rewrite, or Hebrew letters.
+    bool encodeIfPlain(const char16_t* source, char* out) const {
+        const __m128i units = load(source);
+        if (_mm_movemask_epi8(plainLanes(units)) != 0xFFFF)
+            return false;
+        store(units, out);
+        return true;
+    }
+
+    // The same for four units, source[0..4) into out[0..4), for the short
+    // pieces the eight-unit blocks would overrun.
+    bool encodeFourIfPlain(const char16_t* source, char* out) const {
+        const __m128i units = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(source));
+        if ((_mm_movemask_epi8(plainLanes(units)) & 0xFF) != 0xFF)
+            return false;
+        const int bytes = _mm_cvtsi128_si32(packed(units));
+        std::memcpy(out, &bytes, 4);
+        return true;
+    }
+
+    // Encodes source[0..8) into out[0..8) and returns plainPrefix(source):
+    // the bytes of the plain units are right, those after them are to be
+    // written over.
+    int encode(const char16_t* source, char* out) const {
+        const __m128i units = load(source);
+        store(units, out);
+        const __m128i plain = plainLanes(units);
+        return std::countr_one(static_cast<unsigned>(_mm_movemask_epi8(plain))) / 2;
+    }
+
+private:
+    // The byte of every ASCII unit and letter; garbage for other units.
+    static void store(__m128i units, char* out) {
+        _mm_storel_epi64(reinterpret_cast<__m128i*>(out), packed(units));
+    }
+    static __m128i packed(__m128i units) {
+        const __m128i letter = letterLanes(units);
+        const __m128i bytes = _mm_sub_epi16(
+            units, _mm_and_si128(
+                       letter, _mm_set1_epi16(static_cast<short>(TextFileWriter::kHebrewOffset))));
+        return _mm_packus_epi16(bytes, bytes);
+    }
+    static __m128i load(const char16_t* source) {
+        return _mm_loadu_si128(reinterpret_cast<const __m128i*>(source));
+    }
+    // SSE2 compares 16-bit lanes as signed: flipping the top bit makes the
+    // signed order the unsigned one.
+    static __m128i flipped(__m128i units) {
+        return _mm_xor_si128(units, _mm_set1_epi16(static_cast<short>(-0x8000)));
+    }
+    static __m128i letterLanes(__m128i units) {
+        const __m128i fromAlef =
+            _mm_sub_epi16(units, _mm_set1_epi16(static_cast<short>(TextFileWriter::kAlef)));
+        return _mm_cmplt_epi16(flipped(fromAlef),
+                               _mm_set1_epi16(static_cast<short>(
+                                   TextFileWriter::kTav - TextFileWriter::kAlef + 1 - 0x8000)));
+    }
+    static __m128i lanes(const TextFileWriter::Rewrite::Lanes& l) {
+        return _mm_load_si128(reinterpret_cast<const __m128i*>(l.data()));
+    }
+    __m128i plainLanes(__m128i units) const {
+        const __m128i f = flipped(units);
+        const __m128i ascii = _mm_andnot_si128(_mm_cmplt_epi16(f, lanes(rewrite_.asciiFrom)),
+                                               _mm_cmplt_epi16(f, asciiEnd()));
+        __m128i rewritten = _mm_cmpeq_epi16(units, lanes(rewrite_.listed[0]));
+        for (size_t i = 1; i < rewrite_.listed.size(); ++i)
+            rewritten = _mm_or_si128(rewritten, _mm_cmpeq_epi16(units, lanes(rewrite_.listed[i])));
+        return _mm_andnot_si128(rewritten, _mm_or_si128(ascii, letterLanes(units)));
+    }
+    static __m128i asciiEnd() { return _mm_set1_epi16(static_cast<short>(0x80 - 0x8000)); }
+
+    const TextFileWriter::Rewrite& rewrite_;
+};
+#endif
+} // namespace detail
+
 // Nothing rewritten: the plain write().
 inline constexpr TextFileWriter::Rewrite kNoRewrite{};
+
+inline bool TextFileWriter::encodeShortBlocks(const char16_t* source, size_t n,
+                                              const Rewrite& rewrite, char* out) {
+#if defined(__SSE2__)
+    const detail::BlockEncoder encoder(rewrite);
+    if (n >= 8)
+        return encoder.encodeIfPlain(source, out) &&
+               encoder.encodeIfPlain(source + n - 8, out + n - 8);
+    return encoder.encodeFourIfPlain(source, out) &&
+           encoder.encodeFourIfPlain(source + n - 4, out + n - 4);
+#else
+    (void)source, (void)n, (void)rewrite, (void)out;
+    return false;
+#endif
+}
 
 inline void TextFileWriter::write(QStringView piece) {
     write(piece, kNoRewrite);
