@@ -102,7 +102,8 @@ TextFileWriter::TextFileWriter(const QString& path, Unmappable mode) : path_(pat
     std::setvbuf(file_, nullptr, _IONBF, 0);
     table_ = byteTable().bytes.data();
     blocks_ = byteTable().fitsBlocks;
-    buffer_ = std::make_unique<char[]>(kBufferBytes);
+    // Not zeroed first: every byte is written before it goes to the file.
+    buffer_ = std::make_unique_for_overwrite<char[]>(kBufferBytes);
     cur_ = buffer_.get();
     end_ = cur_ + kBufferBytes;
 }

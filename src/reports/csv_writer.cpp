@@ -202,20 +202,20 @@ void WriteCsv(const QString& path, const LedgerModel& ledger, const ModuleState&
                 run->add(',');
                 addCell(*run, file, cells->cell[c]);
             }
+            run->writeTo(file);
         }
         const RowDetail& detail = ledger.rowDetail(r);
-        run->add(',');
-        run->text(file, detail.CounterKey);
+        file.writeAscii(",");
+        WriteStripped(file, detail.CounterKey);
         if (withCounterName) {
-            run->add(',');
-            run->text(file, detail.CounterName);
+            file.writeAscii(",");
+            WriteStripped(file, detail.CounterName);
         }
         if (severalCompanies) {
-            run->add(',');
-            run->text(file, companyDirView(state, detail.CompIndex));
+            file.writeAscii(",");
+            WriteStripped(file, companyDirView(state, detail.CompIndex));
         }
-        run->add("\r\n");
-        run->writeTo(file);
+        file.endLine();
     }
     file.close();
 }
