@@ -151,7 +151,7 @@ private:
             n * Rewrite::kMaxReplacement >= static_cast<size_t>(end_ - cur_))
             return false;
         const auto* source = reinterpret_cast<const char16_t*>(piece.utf16());
-        if (n >= 4 && encodeShortBlocks(source, n, rewrite, cur_)) {
+        if (n >= 8 && encodeShortBlocks(source, n, rewrite, cur_)) {
             cur_ += n;
             return true;
         }
@@ -174,13 +174,15 @@ private:
         cur_ = out;
         return true;
     }
-    // A piece of 4 to 16 units that is all plain (ASCII not rewritten,
-    // Hebrew letters), as two overlapping blocks of eight or four units
-    // that stay inside the piece: each unit's byte lands in its own place,
-    // whichever block writes it last. False when a unit is not plain; the
-    // caller then goes unit by unit over what was written here.
-    static bool encodeShortBlocks(const char16_t* source, size_t n, const Rewrite& rewrite,
-                                  char* out);
+    // A piece of 8 to 16 units that is all plain (ASCII not rewritten,
+    // Hebrew letters), as two overlapping blocks of eight units that stay
+    // inside the piece: each unit's byte lands in its own place, whichever
+    // block writes it last. False when a unit is not plain; the caller then
+    // goes unit by unit over what was written here. Shorter pieces cost less
+    // unit by unit than the blocks' checks. Inline, so that a caller's
+    // constant rewrite set folds into the checks.
+    [[gnu::always_inline]] static bool encodeShortBlocks(const char16_t* source, size_t n,
+                                                         const Rewrite& rewrite, char* out);
     // Most pieces are a field or a tag of a few bytes: two overlapping moves
     // of fixed size copy them without a call to the library's memcpy.
     static void copyBytes(char* to, const char* from, size_t n) {
@@ -263,17 +265,6 @@ public:
         return true;
     }
 
-    // The same for four units, source[0..4) into out[0..4), for the short
-    // pieces the eight-unit blocks would overrun.
-    bool encodeFourIfPlain(const char16_t* source, char* out) const {
-        const __m128i units = _mm_loadl_epi64(reinterpret_cast<const __m128i*>(source));
-        if ((_mm_movemask_epi8(plainLanes(units)) & 0xFF) != 0xFF)
-            return false;
-        const int bytes = _mm_cvtsi128_si32(packed(units));
-        std::memcpy(out, &bytes, 4);
-        return true;
-    }
-
     // Encodes source[0..8) into out[0..8) and returns plainPrefix(source):
     // the bytes of the plain units are right, those after them are to be
     // written over.
@@ -333,15 +324,13 @@ private:
 // Nothing rewritten: the plain write().
 inline constexpr TextFileWriter::Rewrite kNoRewrite{};
 
-inline bool TextFileWriter::encodeShortBlocks(const char16_t* source, size_t n,
-                                              const Rewrite& rewrite, char* out) {
+[[gnu::always_inline]] inline bool TextFileWriter::encodeShortBlocks(const char16_t* source,
+                                                                     size_t n,
+                                                                     const Rewrite& rewrite,
+                                                                     char* out) {
 #if defined(__SSE2__)
     const detail::BlockEncoder encoder(rewrite);
-    if (n >= 8)
-        return encoder.encodeIfPlain(source, out) &&
-               encoder.encodeIfPlain(source + n - 8, out + n - 8);
-    return encoder.encodeFourIfPlain(source, out) &&
-           encoder.encodeFourIfPlain(source + n - 4, out + n - 4);
+    return encoder.encodeIfPlain(source, out) && encoder.encodeIfPlain(source + n - 8, out + n - 8);
 #else
     (void)source, (void)n, (void)rewrite, (void)out;
     return false;
