@@ -255,7 +255,11 @@ std::size_t FormatGroupedTo(char* out, double value, int decimals, bool emptyWhe
 
 std::size_t FormatMoneyPlainTo(char* out, double value) {
     std::uint64_t scaled = 0;
-    if (!detail::fastRoundedScaled(value, 2, scaled)) {
+    // Most amounts are below ten million: the quick rounding straight away,
+    // as fastRoundedScaled would take it, without its general checks.
+    const double magnitude = std::fabs(value);
+    const bool quick = magnitude >= 1e-6 && quickRoundedScaled(magnitude, 2, scaled);
+    if (!quick && !detail::fastRoundedScaled(value, 2, scaled)) {
         // Beyond the fast range (13 digits and more): the grouped text with
         // its commas taken out, rare enough not to matter.
         const size_t len = FormatGroupedTo(out, value, 2);
