@@ -50,8 +50,9 @@ constexpr char kDigitPairs[] =
     "34353637383940414243444546474849505152535455565758596061626364656667"
     "6869707172737475767778798081828384858687888990919293949596979899";
 
-// Digits of n at the end of a buffer; returns where they start.
-char* digitsBackwards(char* end, unsigned long long n) {
+// Digits of n at the end of a buffer; returns where they start. Inline in
+// its few callers: a row of a large file formats eight numbers or more.
+[[gnu::always_inline]] inline char* digitsBackwards(char* end, unsigned long long n) {
     while (n >= 100) {
         const auto pair = static_cast<size_t>(n % 100) * 2;
         n /= 100;
