@@ -887,7 +887,7 @@ void TestCommon::writerShortPiecesMatchGeneralPath() {
         TextFileWriter b(general, unmappable);
         for (int i = 0; i < 200000; ++i) {
             QString piece;
-            const auto length = random() % 21;
+            const auto length = random() % 29;
             // Most pieces plain, so that the short path takes many of them.
             const bool plainOnly = random() % 3 != 0;
             for (unsigned k = 0; k < length; ++k) {
@@ -899,7 +899,7 @@ void TestCommon::writerShortPiecesMatchGeneralPath() {
         }
         // Every character at every place of a plain piece of every short
         // length: the overlapping blocks see it once or twice.
-        for (int length = 1; length <= 17; ++length) {
+        for (int length = 1; length <= 25; ++length) {
             for (int at = 0; at < length; ++at) {
                 for (const char16_t c : alphabet) {
                     QString piece;

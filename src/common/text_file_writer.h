@@ -134,7 +134,7 @@ public:
     static constexpr char16_t kTav = 0x05EA;
     static constexpr unsigned kHebrewOffset = kAlef - 0xE0;
     // Pieces up to this length may take encodeShort().
-    static constexpr qsizetype kShortPiece = 16;
+    static constexpr qsizetype kShortPiece = 24;
 
 private:
     // Most pieces of text are a field of a few characters, ASCII and Hebrew
@@ -174,10 +174,10 @@ private:
         cur_ = out;
         return true;
     }
-    // A piece of 8 to 16 units that is all plain (ASCII not rewritten,
-    // Hebrew letters), as two overlapping blocks of eight units that stay
-    // inside the piece: each unit's byte lands in its own place, whichever
-    // block writes it last. False when a unit is not plain; the caller then
+    // A piece of 8 to 24 units that is all plain (ASCII not rewritten,
+    // Hebrew letters), as two or three overlapping blocks of eight units
+    // that stay inside the piece: each unit's byte lands in its own place,
+    // whichever block writes it last. False when a unit is not plain; the caller then
     // goes unit by unit over what was written here. Shorter pieces cost less
     // unit by unit than the blocks' checks. Inline, so that a caller's
     // constant rewrite set folds into the checks.
@@ -330,7 +330,10 @@ inline constexpr TextFileWriter::Rewrite kNoRewrite{};
                                                                      char* out) {
 #if defined(__SSE2__)
     const detail::BlockEncoder encoder(rewrite);
-    return encoder.encodeIfPlain(source, out) && encoder.encodeIfPlain(source + n - 8, out + n - 8);
+    // [0, 8), [8, 16) past 16 units, and the last eight cover the piece.
+    return encoder.encodeIfPlain(source, out) &&
+           (n <= 16 || encoder.encodeIfPlain(source + 8, out + 8)) &&
+           encoder.encodeIfPlain(source + n - 8, out + n - 8);
 #else
     (void)source, (void)n, (void)rewrite, (void)out;
     return false;
