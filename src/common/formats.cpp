@@ -403,4 +403,19 @@ QString FormatLongDate(QDate date) {
     return date.toString(QStringLiteral("dd/MM/yyyy"));
 }
 
+std::size_t FormatShortDateTo(char* out, QDate date, ShortDateMemo& memo) {
+    const qint64 day = date.toJulianDay();
+    if (memo.held && memo.day == day) {
+        std::memcpy(out, memo.text, sizeof memo.text);
+        return sizeof memo.text;
+    }
+    const std::size_t len = FormatShortDateTo(out, date);
+    memo.held = len == sizeof memo.text;
+    if (memo.held) {
+        memo.day = day;
+        std::memcpy(memo.text, out, sizeof memo.text);
+    }
+    return len;
+}
+
 } // namespace ardcard

@@ -41,6 +41,16 @@ std::size_t FormatMoneyPlainTo(char* out, double value);
 // FormatShortDate's text for years 1000 to 9999 (8 chars); 0 for any other
 // date, whose text the caller takes from FormatShortDate.
 std::size_t FormatShortDateTo(char* out, QDate date);
+
+// The last date a column wrote: rows of one day follow one another, so
+// most dates are copied, not computed.
+struct ShortDateMemo {
+    qint64 day = 0;
+    char text[8] = {};
+    bool held = false;
+};
+// FormatShortDateTo through the column's memo (0 as FormatShortDateTo).
+std::size_t FormatShortDateTo(char* out, QDate date, ShortDateMemo& memo);
 // The decimal text of a whole number, "-" first when negative (what
 // QString::number gives).
 std::size_t FormatIntegerTo(char* out, long long value);

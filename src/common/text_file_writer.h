@@ -1,5 +1,7 @@
 #pragma once
 
+#include "common/copy_bytes.h"
+
 #include <QString>
 #include <QStringView>
 #include <array>
@@ -99,7 +101,7 @@ public:
         // Strictly less: a closed writer has no buffer (both null) and must
         // reach the slow path, which reports it.
         if (heldLead_ == 0 && ascii.size() < static_cast<size_t>(end_ - cur_)) {
-            copyBytes(cur_, ascii.data(), ascii.size());
+            CopyBytes(cur_, ascii.data(), ascii.size());
             cur_ += ascii.size();
             return;
         }
@@ -161,7 +163,7 @@ private:
             const char16_t unit = source[i];
             if (unit < 64 && ((bits >> unit) & 1) != 0) {
                 const std::string_view with = rewrite.replacement(unit);
-                copyBytes(out, with.data(), with.size());
+                CopyBytes(out, with.data(), with.size());
                 out += with.size();
             } else if (unit < 0x80) {
                 *out++ = static_cast<char>(unit);
@@ -183,23 +185,6 @@ private:
     // constant rewrite set folds into the checks.
     [[gnu::always_inline]] static bool encodeShortBlocks(const char16_t* source, size_t n,
                                                          const Rewrite& rewrite, char* out);
-    // Most pieces are a field or a tag of a few bytes: two overlapping moves
-    // of fixed size copy them without a call to the library's memcpy.
-    static void copyBytes(char* to, const char* from, size_t n) {
-        if (n >= 8 && n <= 16) {
-            std::memcpy(to, from, 8);
-            std::memcpy(to + n - 8, from + n - 8, 8);
-        } else if (n >= 4 && n < 8) {
-            std::memcpy(to, from, 4);
-            std::memcpy(to + n - 4, from + n - 4, 4);
-        } else if (n > 0 && n < 4) {
-            to[0] = from[0];
-            to[n / 2] = from[n / 2];
-            to[n - 1] = from[n - 1];
-        } else if (n > 16) {
-            std::memcpy(to, from, n);
-        }
-    }
     void writeAsciiSlow(std::string_view ascii);
     void makeAsciiRoom(size_t most);
     void makeRoom(size_t bytes) {

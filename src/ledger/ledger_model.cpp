@@ -199,24 +199,6 @@ LedgerModel::CellView LedgerModel::cellView(int gridRow, int column, CellScratch
     return view;
 }
 
-namespace {
-// FormatShortDateTo, through the memo of the column's last date.
-size_t memoizedDateTo(char* out, QDate date, LedgerModel::RowCells::DateMemo& memo) {
-    const qint64 day = date.toJulianDay();
-    if (memo.held && memo.day == day) {
-        std::memcpy(out, memo.text, sizeof memo.text);
-        return sizeof memo.text;
-    }
-    const size_t len = FormatShortDateTo(out, date);
-    memo.held = len == sizeof memo.text;
-    if (memo.held) {
-        memo.day = day;
-        std::memcpy(memo.text, out, sizeof memo.text);
-    }
-    return len;
-}
-} // namespace
-
 void LedgerModel::readRow(int gridRow, int lastColumn, MoneyText money, RowCells& cells) const {
     lastColumn = std::min(lastColumn, kColumns - 1);
     if (gridRow < 1 || gridRow > committed_) {
@@ -238,7 +220,7 @@ void LedgerModel::readRow(int gridRow, int lastColumn, MoneyText money, RowCells
         }
         size_t len = 0;
         if (c == 1 || c == 4)
-            len = memoizedDateTo(out, c == 1 ? r.valueDate : r.dueDate, cells.dates[c == 4]);
+            len = FormatShortDateTo(out, c == 1 ? r.valueDate : r.dueDate, cells.dates[c == 4]);
         else if (plainMoney && (c == 8 || c == 9 || c == 11))
             len = FormatMoneyPlainTo(out, c == 8 ? r.amount : c == 9 ? r.foreignAmount : r.balance);
         else

@@ -63,13 +63,7 @@ public:
         CellView cell[kColumns];
         char ascii[kColumns * kNumberTextMax];
         QString text[kColumns]; // the rare general texts
-        // The last date formatted in each date column: rows of one day
-        // follow one another, so most dates are copied, not computed.
-        struct DateMemo {
-            qint64 day = 0;
-            char text[8] = {};
-            bool held = false;
-        } dates[2];
+        ShortDateMemo dates[2]; // the two date columns' last dates
     };
     void readRow(int gridRow, int lastColumn, MoneyText money, RowCells& cells) const;
     // The row's details; grid row 0 and the blank row give an empty detail.

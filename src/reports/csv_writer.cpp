@@ -1,5 +1,7 @@
 #include "reports/csv_writer.h"
 
+#include "common/copy_bytes.h"
+
 #include "common/formats.h"
 #include "common/module_state.h"
 #include "common/text_file_writer.h"
@@ -16,24 +18,6 @@ namespace {
 // Grid columns 0 to 12 are exported; the grid's last four stay on screen.
 constexpr int kLastExportedColumn = LedgerModel::kColumns - 5;
 
-// Most cells are 1 to 16 characters: two overlapping moves of fixed size
-// copy them without a call to the library's memcpy, inline in every caller.
-[[gnu::always_inline]] inline void copyCell(char* to, const char* from, size_t n) {
-    if (n >= 8 && n <= 16) {
-        std::memcpy(to, from, 8);
-        std::memcpy(to + n - 8, from + n - 8, 8);
-    } else if (n >= 4 && n < 8) {
-        std::memcpy(to, from, 4);
-        std::memcpy(to + n - 4, from + n - 4, 4);
-    } else if (n > 0 && n < 4) {
-        to[0] = from[0];
-        to[n / 2] = from[n / 2];
-        to[n - 1] = from[n - 1];
-    } else if (n > 16) {
-        std::memcpy(to, from, n);
-    }
-}
-
 // A row's numbers, dates and separators gathered between its texts, so that
 // each stretch of them goes to the file in one write rather than a write per
 // cell and per comma. The ASCII cells are numbers and dates read with plain
@@ -46,7 +30,7 @@ public:
     static constexpr size_t kRoom = LedgerModel::kColumns * (kNumberTextMax + 1) + 2;
 
     void add(std::string_view ascii) {
-        copyCell(end_, ascii.data(), ascii.size());
+        CopyBytes(end_, ascii.data(), ascii.size());
         end_ += ascii.size();
     }
     void add(char c) { *end_++ = c; }
@@ -73,30 +57,6 @@ void addCell(AsciiRun& run, TextFileWriter& file, const LedgerModel::CellView& c
         run.text(file, cell.text);
 }
 
-// The last date written in a date column: rows of one day follow one
-// another, so most dates are copied, not computed.
-struct DateMemo {
-    qint64 day = 0;
-    char text[8] = {};
-    bool held = false;
-};
-
-// FormatShortDateTo through the column's memo; 0 as FormatShortDateTo.
-size_t memoizedDateTo(char* out, QDate date, DateMemo& memo) {
-    const qint64 day = date.toJulianDay();
-    if (memo.held && memo.day == day) {
-        std::memcpy(out, memo.text, sizeof memo.text);
-        return sizeof memo.text;
-    }
-    const size_t len = FormatShortDateTo(out, date);
-    memo.held = len == sizeof memo.text;
-    if (memo.held) {
-        memo.day = day;
-        std::memcpy(memo.text, out, sizeof memo.text);
-    }
-    return len;
-}
-
 // The longest text of cells 0 to 6 on the typed way with their commas: an
 // int, two dates, two 64-bit integers and two whole numbers below 1e15.
 constexpr size_t kLeadRoom = 128;
@@ -106,10 +66,10 @@ constexpr size_t kLeadRoom = 128;
 // held as text, a reference with a fraction, a date out of the quick
 // range), which the cell-by-cell way writes instead. The typed texts are
 // the grid's own (the same formatting functions), and none holds a comma.
-char* leadCells(char* out, const LedgerRow& row, DateMemo (&dates)[2]) {
+char* leadCells(char* out, const LedgerRow& row, ShortDateMemo (&dates)[2]) {
     out += FormatIntegerTo(out, row.rowNumber);
     *out++ = ',';
-    size_t n = memoizedDateTo(out, row.valueDate, dates[0]);
+    size_t n = FormatShortDateTo(out, row.valueDate, dates[0]);
     if (n == 0)
         return nullptr;
     out += n;
@@ -122,7 +82,7 @@ char* leadCells(char* out, const LedgerRow& row, DateMemo (&dates)[2]) {
         return nullptr;
     out += n;
     *out++ = ',';
-    if ((n = memoizedDateTo(out, row.dueDate, dates[1])) == 0)
+    if ((n = FormatShortDateTo(out, row.dueDate, dates[1])) == 0)
         return nullptr;
     out += n;
     *out++ = ',';
@@ -148,7 +108,7 @@ char* amountCell(char* out, char before, double amount, char after) {
 // Cells 0 to 12 of a row formatted straight into the file's buffer, the
 // texts between them stripped; false, having written nothing, for a row
 // that needs the general conversion somewhere.
-bool writeTypedCells(TextFileWriter& file, const LedgerRow& row, DateMemo (&dates)[2]) {
+bool writeTypedCells(TextFileWriter& file, const LedgerRow& row, ShortDateMemo (&dates)[2]) {
     char* const end = leadCells(file.asciiRoom(kLeadRoom), row, dates);
     if (!end)
         return false;
@@ -191,7 +151,7 @@ void WriteCsv(const QString& path, const LedgerModel& ledger, const ModuleState&
     // Scratches of some kilobytes, kept off the stack.
     const auto cells = std::make_unique<LedgerModel::RowCells>();
     const auto run = std::make_unique<AsciiRun>();
-    DateMemo dates[2];
+    ShortDateMemo dates[2];
     for (int r = 1; r <= lastDataRow; ++r) {
         // Most rows take the typed way; the rest go cell by cell through the
         // grid's general texts.
