@@ -56,6 +56,8 @@ CREATE TABLE Currencies (
     ID INTEGER PRIMARY KEY,
     CurrencyCode TEXT COLLATE NOCASE
 );
+-- Journal lines find their currency by its code.
+CREATE INDEX Currencies_CurrencyCode ON Currencies (CurrencyCode);
 
 -- One row per journal transaction. TransDebID and TransCredID hold the keys
 -- of its debit and credit accounts.
