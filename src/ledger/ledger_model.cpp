@@ -1,6 +1,7 @@
 #include "ledger/ledger_model.h"
 
 #include "common/formats.h"
+#include "common/prefault.h"
 #include "common/text_helpers.h"
 
 #include <algorithm>
@@ -277,8 +278,11 @@ void LedgerModel::append(LedgerRow row) {
 }
 
 void LedgerModel::reserve(qsizetype more) {
-    if (more > 0)
-        rows_.reserve(rows_.size() + static_cast<size_t>(more));
+    if (more <= 0)
+        return;
+    rows_.reserve(rows_.size() + static_cast<size_t>(more));
+    PrefaultForWrite(rows_.data() + rows_.size(),
+                     (rows_.capacity() - rows_.size()) * sizeof(LedgerRow));
 }
 
 void LedgerModel::stage(LedgerRow&& row) {

@@ -80,7 +80,7 @@ public:
     // Inserts a row directly above the blank row.
     void append(LedgerRow row);
     // Room for `more` rows beyond those held and staged, so a read that knows
-    // its count grows the storage once.
+    // its count grows the storage once, mapped in ready for writing.
     void reserve(qsizetype more);
     // Keeps a row for the next commitStaged(); it is not yet part of the grid.
     void stage(LedgerRow&& row);
