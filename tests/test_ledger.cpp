@@ -24,6 +24,7 @@
 #include <QTemporaryDir>
 #include <QTest>
 #include <QUuid>
+#include <limits>
 
 using namespace ardcard;
 
@@ -210,6 +211,43 @@ private Q_SLOTS:
         QCOMPARE(rowCells(model, 1), QStringList(17, QString()));
         QCOMPARE(model.headerData(7, Qt::Horizontal).toString(),
                  u"פרטים                              "_qs);
+    }
+
+    // Batch and transaction numbers show as the database's value reads,
+    // whatever its type, after copies and a sort as well.
+    void batchNumbersShowAsRead_data() {
+        QTest::addColumn<QVariant>("value");
+        QTest::addColumn<QString>("text");
+        QTest::addColumn<bool>("sortsBeforeTen");
+        QTest::newRow("int") << QVariant(7) << u"7"_qs << true;
+        QTest::newRow("unsigned") << QVariant(42u) << u"42"_qs << false;
+        QTest::newRow("most negative 64-bit") << QVariant(std::numeric_limits<qlonglong>::min())
+                                              << u"-9223372036854775808"_qs << true;
+        QTest::newRow("unsigned beyond signed") << QVariant(std::numeric_limits<qulonglong>::max())
+                                                << u"18446744073709551615"_qs << false;
+        QTest::newRow("fraction") << QVariant(12.5) << u"12.5"_qs << false;
+        QTest::newRow("text") << QVariant(u"B-7"_qs) << u"B-7"_qs << true;
+        QTest::newRow("number as text") << QVariant(u" 42 "_qs) << u" 42 "_qs << false;
+        QTest::newRow("Null") << QVariant(QMetaType::fromType<qlonglong>()) << QString() << true;
+        QTest::newRow("no value") << QVariant() << QString() << true;
+    }
+    void batchNumbersShowAsRead() {
+        QFETCH(QVariant, value);
+        QFETCH(QString, text);
+        QFETCH(bool, sortsBeforeTen);
+        LedgerModel model;
+        LedgerRow ten = modelRow(1, 1, 10, 1);
+        LedgerRow read = modelRow(2, 2, 0, 1);
+        read.batchNo = value;
+        const LedgerRow copy = read; // a copy keeps its own value
+        read = copy;
+        model.append(std::move(ten));
+        model.append(copy);
+        QCOMPARE(model.cellText(2, 2), text);
+        QVERIFY(model.sortNumeric(2));
+        QCOMPARE(model.cellText(sortsBeforeTen ? 1 : 2, 2), text);
+        QCOMPARE(model.cellText(sortsBeforeTen ? 2 : 1, 2), u"10"_qs);
+        QCOMPARE(read.batchNo.toString(), text);
     }
 
     void appendKeepsBlankRowLast() {

@@ -319,23 +319,6 @@ std::size_t FormatUnsignedTo(char* out, unsigned long long value) {
     return len;
 }
 
-std::size_t FormatVariantIntegerTo(char* out, const QVariant& value) {
-    if (value.isNull())
-        return 0;
-    switch (value.typeId()) {
-    case QMetaType::Int:
-        return FormatIntegerTo(out, *static_cast<const int*>(value.constData()));
-    case QMetaType::LongLong:
-        return FormatIntegerTo(out, *static_cast<const qlonglong*>(value.constData()));
-    case QMetaType::UInt:
-        return FormatUnsignedTo(out, *static_cast<const uint*>(value.constData()));
-    case QMetaType::ULongLong:
-        return FormatUnsignedTo(out, *static_cast<const qulonglong*>(value.constData()));
-    default:
-        return 0;
-    }
-}
-
 std::size_t PlainWholeTo(char* out, double value) {
     if (!(std::fabs(value) < 1e15) || value != std::trunc(value))
         return 0;

@@ -2,7 +2,6 @@
 
 #include <QDate>
 #include <QString>
-#include <QVariant>
 #include <cstddef>
 #include <cstdint>
 
@@ -55,10 +54,6 @@ std::size_t FormatShortDateTo(char* out, QDate date, ShortDateMemo& memo);
 // QString::number gives).
 std::size_t FormatIntegerTo(char* out, long long value);
 std::size_t FormatUnsignedTo(char* out, unsigned long long value);
-// A value held as an integer (int, long long and their unsigned kinds) as
-// QVariant::toString gives it; 0 for anything else (Null, text, a double),
-// whose text the caller takes from toString().
-std::size_t FormatVariantIntegerTo(char* out, const QVariant& value);
 // PlainNumber's text for a whole number below 1e15 in magnitude, where its
 // 15 significant digits are the number itself; 0 for any other value, whose
 // text the caller takes from PlainNumber.

@@ -58,25 +58,14 @@ const RowDetail& emptyDetail() {
     return detail;
 }
 
-// A value's text read as a number the way a numeric grid sort reads a cell:
-// a number as itself, text that is not a number as 0.
-double numericValue(const QVariant& value) {
-    bool ok = false;
-    const double number = value.toDouble(&ok);
-    if (ok)
-        return number;
-    const double parsed = value.toString().trimmed().toDouble(&ok);
-    return ok ? parsed : 0.0;
-}
-
 double sortKey(const LedgerRow& row, int column) {
     switch (column) {
     case 0:
         return row.rowNumber;
     case 2:
-        return numericValue(row.batchNo);
+        return row.batchNo.sortNumber();
     case 3:
-        return numericValue(row.transId);
+        return row.transId.sortNumber();
     case 5:
         return row.referance;
     case 6:
@@ -125,9 +114,9 @@ size_t formattedTo(char* out, const LedgerRow& r, int column) {
     case 1:
         return FormatShortDateTo(out, r.valueDate);
     case 2:
-        return FormatVariantIntegerTo(out, r.batchNo);
+        return FormatStoredIntegerTo(out, r.batchNo);
     case 3:
-        return FormatVariantIntegerTo(out, r.transId);
+        return FormatStoredIntegerTo(out, r.transId);
     case 4:
         return FormatShortDateTo(out, r.dueDate);
     case 5:

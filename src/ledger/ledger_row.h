@@ -1,8 +1,9 @@
 #pragma once
 
+#include "ledger/stored_value.h"
+
 #include <QDate>
 #include <QString>
-#include <QVariant>
 
 namespace ardcard {
 
@@ -20,8 +21,8 @@ struct RowDetail {
 // database's own values (a number is held without a heap string) and show as
 // that value's text.
 struct LedgerRow {
-    QVariant batchNo;     // col 2, the value's text
-    QVariant transId;     // col 3, the value's text
+    StoredValue batchNo;  // col 2, the value's text
+    StoredValue transId;  // col 3, the value's text
     QString description;  // col 7, " " for Null
     QString currencyCode; // col 10, empty for Null
     QString costCode;     // col 12, " " for Null

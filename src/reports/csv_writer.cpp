@@ -74,11 +74,11 @@ char* leadCells(char* out, const LedgerRow& row, ShortDateMemo (&dates)[2]) {
         return nullptr;
     out += n;
     *out++ = ',';
-    if ((n = FormatVariantIntegerTo(out, row.batchNo)) == 0)
+    if ((n = FormatStoredIntegerTo(out, row.batchNo)) == 0)
         return nullptr;
     out += n;
     *out++ = ',';
-    if ((n = FormatVariantIntegerTo(out, row.transId)) == 0)
+    if ((n = FormatStoredIntegerTo(out, row.transId)) == 0)
         return nullptr;
     out += n;
     *out++ = ',';
