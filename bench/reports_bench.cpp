@@ -52,6 +52,14 @@ void fillLedger(LedgerModel& ledger, ModuleState& state, int rows) {
     };
     static const QString kCodes[] = {QStringLiteral("ש\"ח"), QStringLiteral("USD"),
                                      QStringLiteral("EUR")};
+    // The journal read keeps one string per distinct counter account and
+    // name, shared by every row that names it.
+    std::vector<QString> counterKeys;
+    std::vector<QString> counterNames;
+    for (int k = 0; k < 250; ++k) {
+        counterKeys.push_back(QString::number(3000 + k));
+        counterNames.push_back(QStringLiteral("ספק מספר ") + QString::number(k));
+    }
     ledger.clear();
     ledger.reserve(rows);
     state.periods.clear();
@@ -75,8 +83,8 @@ void fillLedger(LedgerModel& ledger, ModuleState& state, int rows) {
         r.costCode = i % 4 == 0 ? QStringLiteral("A-12") : QStringLiteral(" ");
         r.currencyId = i % 3 + 1;
         r.detail.CompIndex = i < rows / 2 ? 1 : 2;
-        r.detail.CounterKey = QString::number(3000 + i % 250);
-        r.detail.CounterName = QStringLiteral("ספק מספר ") + QString::number(i % 250);
+        r.detail.CounterKey = counterKeys[static_cast<size_t>(i % 250)];
+        r.detail.CounterName = counterNames[static_cast<size_t>(i % 250)];
         state.periods.add(r.valueDate, r.amount);
         ledger.stage(std::move(r));
     }
