@@ -149,6 +149,22 @@ public:
                           QStringLiteral(" אינו מספר שלם"));
         return i;
     }
+    // The line's side: 0 debit, 1 credit, -1 for anything else (Null,
+    // another number, text).
+    int side(int column) const {
+        const QVariant v = rs_.value(column);
+        if (v.isNull())
+            return -1;
+        qlonglong n = -1;
+        if (v.typeId() == QMetaType::LongLong) {
+            n = *static_cast<const qlonglong*>(v.constData());
+        } else {
+            bool ok = false;
+            const int i = v.toInt(&ok);
+            n = ok ? i : -1;
+        }
+        return n == 0 || n == 1 ? static_cast<int>(n) : -1;
+    }
     QString where() const {
         const QVariant id = rs_.value(transId_);
         if (id.isNull())
@@ -229,15 +245,13 @@ int read(const QString& compPath, const QString& accountKey, int compId,
             ++rowNumber;
             // DebitCredit 0 is a debit line, 1 a credit line; any other value
             // keeps the previous line's sign and counter account.
-            const QVariant side = line.value(c.debitCredit);
-            bool sideOk = false;
-            const int debitCredit = side.isNull() ? -1 : side.toInt(&sideOk);
-            if (sideOk && debitCredit == 0) {
+            const int debitCredit = line.side(c.debitCredit);
+            if (debitCredit == 0) {
                 counterKey = line.value(c.transDebId);
                 sign = 1.0;
                 if (options.incNegdiName)
                     counterName = counters.intern(NullToText(line.value(c.dName), dash));
-            } else if (sideOk && debitCredit == 1) {
+            } else if (debitCredit == 1) {
                 counterKey = line.value(c.transCredId);
                 sign = -1.0;
                 if (options.incNegdiName)
