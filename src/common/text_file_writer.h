@@ -61,7 +61,8 @@ public:
 
         std::uint64_t bits = 0;
         std::string_view (*replacement)(char16_t) = nullptr;
-        alignas(16) std::array<Lanes, kMaxListed> listed{}; // unused places hold 0
+        alignas(16) std::array<Lanes, kMaxListed> listed{};
+        size_t listedCount = 0; // the places of `listed` in use
         // The first unit that can be plain ASCII (0 or 64), top bit flipped
         // for the encoder's signed compare.
         alignas(16) Lanes asciiFrom = lanesOf(0x8000);
@@ -77,6 +78,7 @@ public:
                     listed[count] = lanesOf(static_cast<char16_t>(c));
                 ++count;
             }
+            listedCount = count < listed.size() ? count : listed.size();
             if (count > listed.size())
                 asciiFrom = lanesOf(0x8000 + 64);
         }
@@ -294,8 +296,8 @@ private:
         const __m128i f = flipped(units);
         const __m128i ascii = _mm_andnot_si128(_mm_cmplt_epi16(f, lanes(rewrite_.asciiFrom)),
                                                _mm_cmplt_epi16(f, asciiEnd()));
-        __m128i rewritten = _mm_cmpeq_epi16(units, lanes(rewrite_.listed[0]));
-        for (size_t i = 1; i < rewrite_.listed.size(); ++i)
+        __m128i rewritten = _mm_setzero_si128();
+        for (size_t i = 0; i < rewrite_.listedCount; ++i)
             rewritten = _mm_or_si128(rewritten, _mm_cmpeq_epi16(units, lanes(rewrite_.listed[i])));
         return _mm_andnot_si128(rewritten, _mm_or_si128(ascii, letterLanes(units)));
     }
