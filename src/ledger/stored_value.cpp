@@ -39,7 +39,7 @@ StoredValue::StoredValue(const QVariant& value) {
 StoredValue::StoredValue(const StoredValue& other) : kind_(other.kind_) {
     if (kind_ == Kind::Other)
         other_ = new QVariant(*other.other_);
-    else
+    else if (kind_ == Kind::Integer)
         integer_ = other.integer_;
 }
 
@@ -56,18 +56,6 @@ StoredValue& StoredValue::operator=(StoredValue&& other) noexcept {
         take(other);
     }
     return *this;
-}
-
-QVariant StoredValue::toVariant() const {
-    switch (kind_) {
-    case Kind::Integer:
-        return QVariant(integer_);
-    case Kind::Other:
-        return *other_;
-    case Kind::Null:
-        break;
-    }
-    return {};
 }
 
 QString StoredValue::toString() const {

@@ -32,7 +32,6 @@ public:
     bool isNull() const { return kind_ == Kind::Null; }
     bool isInteger() const { return kind_ == Kind::Integer; }
     qlonglong integer() const { return isInteger() ? integer_ : 0; }
-    QVariant toVariant() const;
     QString toString() const;
     // The value as a number, the way a numeric sort of the grid reads its
     // text: a number as itself, text that is not a number as 0.
@@ -40,18 +39,21 @@ public:
 
 private:
     enum class Kind : unsigned char { Null, Integer, Other };
-    // Moves other's value (kind_ already set to other's kind) and leaves it Null.
+    // Moves other's value (kind_ already set to other's kind) and leaves it
+    // Null. The union is read only through the member its kind names.
     void take(StoredValue& other) noexcept {
         if (kind_ == Kind::Other)
             other_ = other.other_;
         else
-            integer_ = other.integer_;
+            integer_ = kind_ == Kind::Integer ? other.integer_ : 0;
         other.kind_ = Kind::Null;
+        other.integer_ = 0;
     }
     void release() noexcept {
         if (kind_ == Kind::Other)
             delete other_;
         kind_ = Kind::Null;
+        integer_ = 0;
     }
 
     union {
