@@ -29,7 +29,6 @@ public:
     StoredValue& operator=(StoredValue&& other) noexcept;
     ~StoredValue() { release(); }
 
-    bool isNull() const { return kind_ == Kind::Null; }
     bool isInteger() const { return kind_ == Kind::Integer; }
     qlonglong integer() const { return isInteger() ? integer_ : 0; }
     QString toString() const;
