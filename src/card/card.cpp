@@ -51,11 +51,9 @@ Card::Card(QWidget* parent) : QWidget(parent), ui_(std::make_unique<CardScreen>(
     ui_->DocLines->resizeColumnsToContents();
     connectControls();
     EnableButtons(false);
-    try {
-        ReadConnParams();
-    } catch (...) {
-        // The card opens with whatever connection values it has.
-    }
+    // Reading never fails: a missing or unreadable settings file gives the
+    // defaults.
+    ReadConnParams();
 }
 
 Card::~Card() = default;

@@ -4,6 +4,7 @@
 #include "card/card.h"
 
 #include "card/card_screen.h"
+#include "common/failure.h"
 #include "common/module_state.h"
 #include "common/text_helpers.h"
 #include "connection/company_details.h"
@@ -34,7 +35,7 @@ void Card::takeCompanyDirs(const QString& text, bool passOverFailures) {
         }
         try {
             body();
-        } catch (...) {
+        } catch (const Failure&) {
             // SetParams goes on at the next step.
         }
     };
@@ -69,7 +70,7 @@ void Card::Image1_Click() {
         ui_->txtCompPath->setText(state.CompanyDirText);
         if (same) // setText reports no change; the handler runs all the same
             txtCompPath_Change();
-    } catch (...) {
+    } catch (const Failure&) {
         // The card stays as it was.
     }
 }

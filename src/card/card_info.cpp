@@ -3,6 +3,7 @@
 #include "card/card.h"
 
 #include "card/card_screen.h"
+#include "common/failure.h"
 #include "common/module_state.h"
 #include "connection/conn_string.h"
 #include "info/ard7info.h"
@@ -23,7 +24,7 @@ void Card::imgAccKey_DblClick() {
                                                 conn.ConnDataBase, conn.ConnType);
         Ard7Info info;
         info.OpenAccountHTML(key, connStr, conn.ConnType);
-    } catch (...) {
+    } catch (const Failure&) {
     }
 }
 

@@ -3,6 +3,7 @@
 #include "card/card.h"
 
 #include "card/card_screen.h"
+#include "common/failure.h"
 #include "common/module_state.h"
 #include "common/text_helpers.h"
 #include "connection/settings_store.h"
@@ -43,7 +44,7 @@ bool isTrueText(const QString& text) {
 void step(const std::function<void()>& body) {
     try {
         body();
-    } catch (...) {
+    } catch (const Failure&) {
         // The page may lack a value or give one that does not fit: go on.
     }
 }

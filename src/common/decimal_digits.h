@@ -1,22 +1,28 @@
 #pragma once
 
-#include <string>
+#include <cstdint>
 
 namespace ardcard::detail {
 
-// A finite double as 15 significant decimal digits, the precision at which
-// the host product's formats and text conversions see a number. `digits`
-// holds exactly 15 digits d1..d15 and value = d1.d2...d15 x 10^exponent.
-// Zero (and -0.0) gives fifteen zeros and exponent 0.
-struct DecimalDigits {
-    std::string digits;
+// A double as the host product's formats and text conversions see it: its
+// magnitude at 15 significant digits, value = digits x 10^exponent with
+// 10^14 <= digits < 10^15, correctly rounded from the exact binary value
+// (an exact tie to the even digit). Zero, -0.0 and values that are not
+// finite give digits 0.
+struct SignificantDigits {
+    std::uint64_t digits = 0;
     int exponent = 0;
     bool negative = false;
 };
-DecimalDigits toDecimalDigits(double value);
+SignificantDigits ToSignificantDigits(double value);
 
-// |value| rounded half away from zero to `decimals` places, as a digit string
-// without a decimal point (the value times 10^decimals); "0" for zero.
-std::string roundedScaled(const DecimalDigits& d, int decimals);
+// |value| rounded half away from zero to `decimals` places (0 or more): the
+// value times 10^decimals is `scaled` followed by `zeros` zeros (a large
+// value's digits beyond its 15 significant ones).
+struct Scaled {
+    std::uint64_t scaled = 0;
+    int zeros = 0;
+};
+Scaled RoundedScaled(const SignificantDigits& d, int decimals);
 
 } // namespace ardcard::detail

@@ -2,29 +2,14 @@
 
 namespace ardcard {
 
-QString HtmlEscape(const QString& text) {
+QString HtmlEscape(QStringView text) {
     QString out;
     out.reserve(text.size() + text.size() / 8);
     for (const QChar c : text) {
-        switch (c.unicode()) {
-        case '&':
-            out += QLatin1String("&amp;");
-            break;
-        case '<':
-            out += QLatin1String("&lt;");
-            break;
-        case '>':
-            out += QLatin1String("&gt;");
-            break;
-        case '"':
-            out += QLatin1String("&quot;");
-            break;
-        case '\'':
-            out += QLatin1String("&#39;");
-            break;
-        default:
+        if (const char* entity = HtmlEntity(c.unicode()))
+            out += QLatin1String(entity);
+        else
             out += c;
-        }
     }
     return out;
 }

@@ -57,17 +57,18 @@ QString NullToNbsp(const QVariant& value) {
 }
 
 QString PlainNumber(double value) {
-    const detail::DecimalDigits d = detail::toDecimalDigits(value);
-    std::string digits = d.digits;
-    const size_t last = digits.find_last_not_of('0');
-    if (last == std::string::npos)
+    const detail::SignificantDigits d = detail::ToSignificantDigits(value);
+    if (d.digits == 0)
         return QStringLiteral("0");
-    digits.resize(last + 1);
+    std::string digits = std::to_string(d.digits); // 15 digits
+    // digits x 10^exponent with the point after the first digit: e is the
+    // power of ten of that first digit.
+    const int e = d.exponent + 14;
+    digits.resize(digits.find_last_not_of('0') + 1);
 
     std::string out;
     if (d.negative)
         out += '-';
-    const int e = d.exponent;
     const int len = static_cast<int>(digits.size());
     if (e < 0) {
         out += "0.";

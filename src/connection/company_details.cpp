@@ -1,5 +1,6 @@
 #include "connection/company_details.h"
 
+#include "common/failure.h"
 #include "common/module_state.h"
 #include "common/text_helpers.h"
 #include "connection/conn_string.h"
@@ -46,7 +47,7 @@ bool ReadCompanyDetails(const QString& compPath) {
         }
         rs.Close();
         return true;
-    } catch (...) {
+    } catch (const Failure&) {
         // Company details are a nicety: whatever fails, the card goes on.
         return false;
     }

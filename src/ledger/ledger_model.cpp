@@ -1,7 +1,6 @@
 #include "ledger/ledger_model.h"
 
 #include "common/formats.h"
-#include "common/prefault.h"
 #include "common/text_helpers.h"
 
 #include <algorithm>
@@ -107,7 +106,7 @@ const QString* heldText(const LedgerRow& r, int column) {
 // The ASCII text of a formatted column into `out`, or 0 when the value
 // needs the general conversion (generalText). Never 0 for a real text: every
 // formatted cell has at least one character.
-size_t formattedTo(char* out, const LedgerRow& r, int column) {
+size_t formattedTo(char* out, const LedgerRow& r, int column, bool thousands) {
     switch (column) {
     case 0:
         return FormatIntegerTo(out, r.rowNumber);
@@ -124,11 +123,11 @@ size_t formattedTo(char* out, const LedgerRow& r, int column) {
     case 6:
         return PlainWholeTo(out, r.ref2);
     case 8:
-        return FormatMoneyTo(out, r.amount);
+        return FormatMoneyTo(out, r.amount, thousands);
     case 9:
-        return FormatMoneyTo(out, r.foreignAmount);
+        return FormatMoneyTo(out, r.foreignAmount, thousands);
     case 11:
-        return FormatMoneyTo(out, r.balance);
+        return FormatMoneyTo(out, r.balance, thousands);
     case 13:
         return FormatIntegerTo(out, r.fullMatch);
     case 14:
@@ -163,30 +162,38 @@ QString generalText(const LedgerRow& r, int column) {
 
 } // namespace
 
+namespace {
+// The view of one cell of a data row: a held text, ASCII formatted into
+// `ascii`, or the general text put into `text`.
+LedgerModel::CellView viewOf(const LedgerRow& r, int column, bool thousands, char* ascii,
+                             QString& text) {
+    LedgerModel::CellView view;
+    if (const QString* held = heldText(r, column)) {
+        view.text = *held;
+    } else if (const size_t len = formattedTo(ascii, r, column, thousands)) {
+        view.isAscii = true;
+        view.ascii = std::string_view(ascii, len);
+    } else {
+        text = generalText(r, column);
+        view.text = text;
+    }
+    return view;
+}
+} // namespace
+
 LedgerModel::CellView LedgerModel::cellView(int gridRow, int column, CellScratch& scratch) const {
-    CellView view;
     if (column < 0 || column >= kColumns)
-        return view;
+        return {};
     if (gridRow == 0) {
         scratch.text = headerText(column);
+        CellView view;
         view.text = scratch.text;
         return view;
     }
     if (gridRow < 1 || gridRow > committed_)
-        return view;
-    const LedgerRow& r = rows_[static_cast<size_t>(gridRow - 1)];
-    if (const QString* held = heldText(r, column)) {
-        view.text = *held;
-        return view;
-    }
-    if (const size_t len = formattedTo(scratch.ascii, r, column)) {
-        view.isAscii = true;
-        view.ascii = std::string_view(scratch.ascii, len);
-        return view;
-    }
-    scratch.text = generalText(r, column);
-    view.text = scratch.text;
-    return view;
+        return {};
+    return viewOf(rows_[static_cast<size_t>(gridRow - 1)], column, true, scratch.ascii,
+                  scratch.text);
 }
 
 void LedgerModel::readRow(int gridRow, int lastColumn, MoneyText money, RowCells& cells) const {
@@ -197,35 +204,9 @@ void LedgerModel::readRow(int gridRow, int lastColumn, MoneyText money, RowCells
         return;
     }
     const LedgerRow& r = rows_[static_cast<size_t>(gridRow - 1)];
-    const bool plainMoney = money == MoneyText::Plain;
-    // The formatted cells follow one another in one buffer with room for
-    // the longest text of every column.
-    char* out = cells.ascii;
-    for (int c = 0; c <= lastColumn; ++c) {
-        CellView& view = cells.cell[c];
-        if (const QString* held = heldText(r, c)) {
-            view = CellView();
-            view.text = *held;
-            continue;
-        }
-        size_t len = 0;
-        if (c == 1 || c == 4)
-            len = FormatShortDateTo(out, c == 1 ? r.valueDate : r.dueDate, cells.dates[c == 4]);
-        else if (plainMoney && (c == 8 || c == 9 || c == 11))
-            len = FormatMoneyPlainTo(out, c == 8 ? r.amount : c == 9 ? r.foreignAmount : r.balance);
-        else
-            len = formattedTo(out, r, c);
-        view.isAscii = len != 0;
-        if (len != 0) {
-            view.ascii = std::string_view(out, len);
-            view.text = QStringView();
-            out += len;
-        } else {
-            cells.text[c] = generalText(r, c);
-            view.ascii = std::string_view();
-            view.text = cells.text[c];
-        }
-    }
+    for (int c = 0; c <= lastColumn; ++c)
+        cells.cell[c] = viewOf(r, c, money == MoneyText::Grouped, cells.ascii + c * kNumberTextMax,
+                               cells.text[c]);
 }
 
 QString LedgerModel::cellText(int gridRow, int column) const {
@@ -270,8 +251,6 @@ void LedgerModel::reserve(qsizetype more) {
     if (more <= 0)
         return;
     rows_.reserve(rows_.size() + static_cast<size_t>(more));
-    PrefaultForWrite(rows_.data() + rows_.size(),
-                     (rows_.capacity() - rows_.size()) * sizeof(LedgerRow));
 }
 
 void LedgerModel::stage(LedgerRow&& row) {

@@ -55,15 +55,13 @@ public:
     // Cells 0 to lastColumn of one data row at once, for writers that go
     // through every row: one lookup of the row instead of one per cell, the
     // same views cellView gives. With MoneyText::Plain the amounts (columns
-    // 8, 9 and 11) come without their thousands commas, so that no ASCII
-    // view holds a ",". The views live until `cells` is reused or the row
-    // changes.
+    // 8, 9 and 11) come without their thousands commas, as the CSV file
+    // writes them. The views live until `cells` is reused or the row changes.
     enum class MoneyText { Grouped, Plain };
     struct RowCells {
         CellView cell[kColumns];
         char ascii[kColumns * kNumberTextMax];
         QString text[kColumns]; // the rare general texts
-        ShortDateMemo dates[2]; // the two date columns' last dates
     };
     void readRow(int gridRow, int lastColumn, MoneyText money, RowCells& cells) const;
     // The row's details; grid row 0 and the blank row give an empty detail.
@@ -80,7 +78,7 @@ public:
     // Inserts a row directly above the blank row.
     void append(LedgerRow row);
     // Room for `more` rows beyond those held and staged, so a read that knows
-    // its count grows the storage once, mapped in ready for writing.
+    // its count grows the storage once.
     void reserve(qsizetype more);
     // Keeps a row for the next commitStaged(); it is not yet part of the grid.
     void stage(LedgerRow&& row);

@@ -5,6 +5,8 @@
 #include <QString>
 #include <QVariant>
 #include <cstddef>
+#include <memory>
+#include <variant>
 
 namespace ardcard {
 
@@ -18,48 +20,25 @@ public:
     // Implicit, so that a row is filled by assigning what was read.
     StoredValue() = default;
     StoredValue(const QVariant& value);
-    StoredValue(int value) : integer_(value), kind_(Kind::Integer) {}
-    StoredValue(unsigned value) : integer_(value), kind_(Kind::Integer) {}
-    StoredValue(qlonglong value) : integer_(value), kind_(Kind::Integer) {}
+    StoredValue(qlonglong value) : value_(value) {}
+    StoredValue(int value) : value_(qlonglong{value}) {}
     StoredValue(double value) : StoredValue(QVariant(value)) {}
     StoredValue(const QString& value) : StoredValue(QVariant(value)) {}
     StoredValue(const StoredValue& other);
-    StoredValue(StoredValue&& other) noexcept : kind_(other.kind_) { take(other); }
+    StoredValue(StoredValue&&) noexcept = default;
     StoredValue& operator=(const StoredValue& other);
-    StoredValue& operator=(StoredValue&& other) noexcept;
-    ~StoredValue() { release(); }
+    StoredValue& operator=(StoredValue&&) noexcept = default;
+    ~StoredValue() = default;
 
-    bool isInteger() const { return kind_ == Kind::Integer; }
-    qlonglong integer() const { return isInteger() ? integer_ : 0; }
+    bool isInteger() const { return std::holds_alternative<qlonglong>(value_); }
+    qlonglong integer() const { return isInteger() ? std::get<qlonglong>(value_) : 0; }
     QString toString() const;
     // The value as a number, the way a numeric sort of the grid reads its
     // text: a number as itself, text that is not a number as 0.
     double sortNumber() const;
 
 private:
-    enum class Kind : unsigned char { Null, Integer, Other };
-    // Moves other's value (kind_ already set to other's kind) and leaves it
-    // Null. The union is read only through the member its kind names.
-    void take(StoredValue& other) noexcept {
-        if (kind_ == Kind::Other)
-            other_ = other.other_;
-        else
-            integer_ = kind_ == Kind::Integer ? other.integer_ : 0;
-        other.kind_ = Kind::Null;
-        other.integer_ = 0;
-    }
-    void release() noexcept {
-        if (kind_ == Kind::Other)
-            delete other_;
-        kind_ = Kind::Null;
-        integer_ = 0;
-    }
-
-    union {
-        qlonglong integer_ = 0;
-        QVariant* other_;
-    };
-    Kind kind_ = Kind::Null;
+    std::variant<std::monostate, qlonglong, std::unique_ptr<QVariant>> value_;
 };
 
 static_assert(sizeof(StoredValue) == 16);

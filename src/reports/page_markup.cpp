@@ -1,9 +1,8 @@
 #include "reports/page_markup.h"
 
+#include "common/html_escape.h"
 #include "common/text_file_writer.h"
 #include "common/text_helpers.h"
-
-#include <cstdint>
 
 namespace ardcard::reports {
 
@@ -15,47 +14,45 @@ QString OutputPath(QStringView fileName) {
 }
 
 namespace {
-// & < > " and ' are all below 64, so the writer finds them with one bit test
-// per character while it encodes; most cells hold none.
-std::string_view entityFor(char16_t c) {
-    switch (c) {
-    case u'&':
-        return "&amp;";
-    case u'<':
-        return "&lt;";
-    case u'>':
-        return "&gt;";
-    case u'"':
-        return "&quot;";
-    default:
-        return "&#39;";
+// A CSV field loses " ' and , : the fields are never quoted, so none may
+// carry the separator.
+struct StrippedFromCsv {
+    const char* operator()(char16_t c) const {
+        return c == u'"' || c == u'\'' || c == u',' ? "" : nullptr;
     }
-}
-constexpr TextFileWriter::Rewrite kEscapeMarkup{
-    (std::uint64_t{1} << '&') | (std::uint64_t{1} << '<') | (std::uint64_t{1} << '>') |
-        (std::uint64_t{1} << '"') | (std::uint64_t{1} << '\''),
-    entityFor};
+};
+struct EscapedForPage {
+    const char* operator()(char16_t c) const { return HtmlEntity(c); }
+};
 
-// A CSV field loses " ' and , (all below 64 as well).
-constexpr TextFileWriter::Rewrite kStripSeparators{
-    (std::uint64_t{1} << '"') | (std::uint64_t{1} << '\'') | (std::uint64_t{1} << ','),
-    [](char16_t) { return std::string_view(); }};
+// Writes `text` with each character that `Replacement` names written as
+// its replacement instead; the runs between them go to the file as they
+// stand, so a cell costs no copy of its own.
+template <typename Replacement> void writeReplacing(TextFileWriter& file, QStringView text) {
+    const Replacement replacement;
+    qsizetype from = 0;
+    for (qsizetype i = 0; i < text.size(); ++i) {
+        // Every character rewritten is ASCII below "@": one compare passes
+        // over letters, Hebrew among them.
+        const char16_t c = text[i].unicode();
+        if (c >= u'@')
+            continue;
+        if (const char* with = replacement(c)) {
+            file.write(text.sliced(from, i - from));
+            file.writeAscii(with);
+            from = i + 1;
+        }
+    }
+    file.write(text.sliced(from));
+}
 } // namespace
 
 void WriteEscaped(TextFileWriter& file, QStringView text) {
-    file.write(text, kEscapeMarkup);
-}
-
-void WriteEscaped(TextFileWriter& file, std::string_view ascii) {
-    file.writeAscii(ascii, kEscapeMarkup);
+    writeReplacing<EscapedForPage>(file, text);
 }
 
 void WriteStripped(TextFileWriter& file, QStringView text) {
-    file.write(text, kStripSeparators);
-}
-
-void WriteStripped(TextFileWriter& file, std::string_view ascii) {
-    file.writeAscii(ascii, kStripSeparators);
+    writeReplacing<StrippedFromCsv>(file, text);
 }
 
 QStringView TrimSpaces(QStringView text) {

@@ -26,15 +26,12 @@ inline constexpr char16_t kCharsetLine[] =
 QString OutputPath(QStringView fileName);
 
 // Writes text from the database, the screen or a path into a page so that
-// it shows as text: & < > " ' become entities. Runs without those characters
-// go to the file as they stand, so a cell costs no extra allocation.
+// it shows as text: & < > " ' become entities (HtmlEntity).
 void WriteEscaped(TextFileWriter& file, QStringView text);
-void WriteEscaped(TextFileWriter& file, std::string_view ascii);
 
 // Writes a CSV field without its double quotes, single quotes and commas,
 // so that no field can carry the separator (the fields are never quoted).
 void WriteStripped(TextFileWriter& file, QStringView text);
-void WriteStripped(TextFileWriter& file, std::string_view ascii);
 
 // The text without leading and trailing spaces (only the space character:
 // a company name keeps a tab or a no-break space of its own).
