@@ -3,23 +3,7 @@
 namespace ardcard {
 
 void PeriodTotals::clear() {
-    weeks_.clear();
-    months_.clear();
-    quarters_.clear();
-    last_ = YearCells();
-}
-
-PeriodTotals::YearCells& PeriodTotals::cellsOf(int year) {
-    if (last_.weeks && last_.year == year)
-        return last_;
-    const QDate first(year, 1, 1);
-    last_.year = year;
-    last_.firstDay = first.toJulianDay();
-    last_.firstWeekday = first.dayOfWeek() % 7;
-    last_.weeks = weeks_[year].data();
-    last_.months = months_[year].data();
-    last_.quarters = quarters_[year].data();
-    return last_;
+    years_.clear();
 }
 
 int PeriodTotals::weekOfYear(QDate date) {
@@ -29,14 +13,11 @@ int PeriodTotals::weekOfYear(QDate date) {
 }
 
 void PeriodTotals::add(QDate date, double amount) {
-    int year = 0;
-    int month = 0;
-    date.getDate(&year, &month, nullptr);
-    YearCells& cells = cellsOf(year);
-    const qint64 dayOfYear = date.toJulianDay() - cells.firstDay + 1;
-    cells.weeks[(dayOfYear - 1 + cells.firstWeekday) / 7 + 1] += amount;
-    cells.months[month] += amount;
-    cells.quarters[(month - 1) / 3 + 1] += amount;
+    Year& year = years_[date.year()];
+    const int month = date.month();
+    year.weeks[static_cast<size_t>(weekOfYear(date))] += amount;
+    year.months[static_cast<size_t>(month)] += amount;
+    year.quarters[static_cast<size_t>((month - 1) / 3 + 1)] += amount;
 }
 
 int PeriodTotals::periodsPerYear(int kind) {
@@ -52,52 +33,41 @@ int PeriodTotals::periodsPerYear(int kind) {
     }
 }
 
-namespace {
-template <typename Map> double cell(const Map& map, int year, int period) {
-    const auto it = map.find(year);
-    if (it == map.end() || period < 1 || period >= static_cast<int>(it->second.size()))
-        return 0.0;
-    return it->second[period];
+// The cells of one kind (index 1..count), or null for an unknown kind.
+const double* PeriodTotals::cells(const Year& year, int kind, int* count) {
+    *count = periodsPerYear(kind);
+    switch (kind) {
+    case Week:
+        return year.weeks.data();
+    case Month:
+        return year.months.data();
+    case Quarter:
+        return year.quarters.data();
+    default:
+        return nullptr;
+    }
 }
 
-template <typename Map> std::vector<int> years(const Map& map) {
+double PeriodTotals::value(int kind, int year, int period) const {
+    const auto it = years_.find(year);
+    int count = 0;
+    const double* values = it == years_.end() ? nullptr : cells(it->second, kind, &count);
+    return values && period >= 1 && period <= count ? values[period] : 0.0;
+}
+
+std::vector<int> PeriodTotals::yearsDescending(int kind) const {
     std::vector<int> out;
-    for (auto it = map.rbegin(); it != map.rend(); ++it) {
-        for (double v : it->second) {
-            if (v != 0.0) {
+    for (auto it = years_.rbegin(); it != years_.rend(); ++it) {
+        int count = 0;
+        const double* values = cells(it->second, kind, &count);
+        for (int period = 1; values && period <= count; ++period) {
+            if (values[period] != 0.0) {
                 out.push_back(it->first);
                 break;
             }
         }
     }
     return out;
-}
-} // namespace
-
-double PeriodTotals::value(int kind, int year, int period) const {
-    switch (kind) {
-    case Week:
-        return cell(weeks_, year, period);
-    case Month:
-        return cell(months_, year, period);
-    case Quarter:
-        return cell(quarters_, year, period);
-    default:
-        return 0.0;
-    }
-}
-
-std::vector<int> PeriodTotals::yearsDescending(int kind) const {
-    switch (kind) {
-    case Week:
-        return years(weeks_);
-    case Month:
-        return years(months_);
-    case Quarter:
-        return years(quarters_);
-    default:
-        return {};
-    }
 }
 
 } // namespace ardcard

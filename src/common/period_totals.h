@@ -26,21 +26,14 @@ public:
     std::vector<int> yearsDescending(int kind) const;
 
 private:
-    // The cells of one year; a fetch adds line after line of the same year.
-    struct YearCells {
-        int year = 0;
-        qint64 firstDay = 0;     // Julian day of 1 January
-        int firstWeekday = 0;    // Sunday 0 .. Saturday 6
-        double* weeks = nullptr; // index 1..54
-        double* months = nullptr;
-        double* quarters = nullptr;
+    struct Year {
+        std::array<double, 55> weeks{}; // index 1..54
+        std::array<double, 13> months{};
+        std::array<double, 5> quarters{};
     };
-    YearCells& cellsOf(int year);
+    static const double* cells(const Year& year, int kind, int* count);
 
-    std::map<int, std::array<double, 55>> weeks_;   // index 1..54
-    std::map<int, std::array<double, 13>> months_;  // index 1..12
-    std::map<int, std::array<double, 5>> quarters_; // index 1..4
-    YearCells last_; // map entries never move, so their addresses stay valid
+    std::map<int, Year> years_;
 };
 
 } // namespace ardcard

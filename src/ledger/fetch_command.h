@@ -9,6 +9,36 @@ namespace ardcard {
 
 class LedgerModel;
 
+// The progress bar a read moves: an outline whose width is read and a fill
+// whose width is set. The card puts its two frames behind this; the read
+// itself knows nothing of widgets.
+class ProgressSink {
+public:
+    virtual ~ProgressSink() = default;
+    virtual int frameWidth() const = 0;
+    virtual void setFillWidth(int width) = 0;
+};
+
+// A progress bar nobody sees.
+class NoProgress final : public ProgressSink {
+public:
+    int frameWidth() const override { return 0; }
+    void setFillWidth(int) override {}
+};
+
+// Reads one account's journal lines from one company directory (`CompPath`
+// becomes the database of the connection string built from
+// moduleState().conn) into `ledger`, and the lines' amounts into
+// moduleState()'s currency and period totals (ReadJournal).
+//
+// Returns -1 when the query ran (with or without lines), 0 when the account
+// is hidden in this company (nothing read, `failure` left empty) or the read
+// failed: then `failure` holds a description for the caller to show, and the
+// rows and totals gathered before the failure stay.
+int ReadTransactions7(const QString& CompPath, const QString& pAccountKey, int pCompID,
+                      const JournalOptions& options, LedgerModel& ledger, ProgressSink& progress,
+                      QString* failure = nullptr);
+
 // What the fetch asks of the screen that runs it. The card fills this from
 // its check boxes and its own per-directory read (which shows a failure
 // itself); tests fill it with plain values.

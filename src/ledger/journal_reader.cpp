@@ -1,7 +1,6 @@
 #include "ledger/journal_reader.h"
 
 #include "common/failure.h"
-#include "common/module_state.h"
 #include "common/text_helpers.h"
 #include "connection/conn_string.h"
 #include "connection/database.h"
@@ -177,166 +176,163 @@ private:
     int transId_;
 };
 
-bool accountHidden() {
-    const ModuleState& state = moduleState();
-    const QString& hidden = state.company.HiddenAccountsFilter;
-    return !hidden.isEmpty() &&
-           hidden.compare(state.CurrentAccountFilter, Qt::CaseInsensitive) == 0;
-}
+// Turns the lines of the main query into grid rows, in read order: the row
+// numbers, the running balance, the counter account and the totals carry
+// over from line to line.
+class LineMapper {
+public:
+    LineMapper(const Recordset& rs, const JournalRequest& request)
+        : c_(resolveColumns(rs, request.options.incNegdiName)), line_(rs, c_.transId),
+          options_(request.options), compId_(request.compId), totals_(request.totals) {}
 
-// fetched / count of the frame's width, halves to even; never outside the frame
-// even when the count query announced fewer lines than the main query gave.
-int fillWidth(qint64 fetched, double recCount, int frameWidth) {
-    const double width = std::nearbyint(static_cast<double>(fetched) / recCount * frameWidth);
-    return static_cast<int>(std::clamp(width, 0.0, static_cast<double>(std::max(frameWidth, 0))));
-}
+    const JournalTotals& totals() const { return totals_; }
 
-int read(const QString& compPath, const QString& accountKey, int compId,
-         const JournalOptions& options, LedgerModel& ledger, ProgressSink& progress) {
-    ModuleState& state = moduleState();
-    progress.setFillWidth(0);
-
-    const ConnValues& conn = state.conn;
-    Connection connection;
-    connection.setTimeout(60);
-    connection.open(
-        BuildConnString(conn.ConnServer, conn.ConnUID, conn.ConnPWD, compPath, conn.ConnType));
-    Recordset rs(connection);
-
-    rs.Open(JournalCountSql(accountKey, options.onlyOpen, options.incNegdiName),
-            CursorKind::Dynamic);
-    if (rs.Eof())
-        return -1;
-    const QVariant countValue = rs.value(resolve(rs, QStringLiteral("RecCount")));
-    const double recCount = countValue.isNull() ? 0.0 : countValue.toDouble();
-    rs.Close();
-    if (recCount == 0.0)
-        return -1;
-
-    rs.Open(JournalMainSql(accountKey, options.onlyOpen, options.incNegdiName),
-            CursorKind::Dynamic);
-    progress.setFillWidth(0);
-    const Columns c = resolveColumns(rs, options.incNegdiName);
-    const LineReader line(rs, c.transId);
-    const int frameWidth = progress.frameWidth();
-    if (!options.onlyGraph)
-        ledger.reserve(static_cast<qsizetype>(recCount));
-    const qsizetype commitBatch =
-        std::max(kMinCommitBatch, static_cast<qsizetype>(recCount) / kCommitsPerRead);
-
-    StringPool codes(256);
-    StringPool counters(4096);
-    const QString space = QStringLiteral(" ");
-    const QString dash = QStringLiteral("-");
-
-    int rowNumber = 0;
-    qint64 fetched = 0;
-    double balance = 0.0;
-    double sign = 0.0;
-    QVariant counterKey;
-    QString counterName;
-    QDate graphDate;
-
-    while (!rs.Eof()) {
-        const QDate valueDate = line.date(c.valueDate, u"ValueDate");
-        const QDate dueDate = line.date(c.dueDate, u"DueDate");
-        const QString key = line.required(c.accountKey, u"AccountKey").toString();
-        if (!key.isEmpty()) {
-            ++rowNumber;
-            // DebitCredit 0 is a debit line, 1 a credit line; any other value
-            // keeps the previous line's sign and counter account.
-            const int debitCredit = line.side(c.debitCredit);
-            if (debitCredit == 0) {
-                counterKey = line.value(c.transDebId);
-                sign = 1.0;
-                if (options.incNegdiName)
-                    counterName = counters.intern(NullToText(line.value(c.dName), dash));
-            } else if (debitCredit == 1) {
-                counterKey = line.value(c.transCredId);
-                sign = -1.0;
-                if (options.incNegdiName)
-                    counterName = counters.intern(NullToText(line.value(c.cName), dash));
-            }
-            const double amount = line.requiredNumber(c.suF, u"SuF") * sign;
-            const double foreignAmount = line.requiredNumber(c.suFDlr, u"SuFDlr") * sign;
-            balance += amount;
-            const int fullMatch = line.integer(c.fullMatch, u"FullMatch");
-
-            if (!options.onlyGraph) {
-                LedgerRow row;
-                row.rowNumber = rowNumber;
-                row.valueDate = valueDate;
-                row.batchNo = line.required(c.batchNo, u"BatchNo");
-                row.transId = line.required(c.transId, u"TransID");
-                row.dueDate = dueDate;
-                row.referance = line.numberOrZero(c.referance, u"Referance");
-                row.ref2 = line.numberOrZero(c.ref2, u"Ref2");
-                row.description = NullToText(line.value(c.description), space);
-                row.amount = amount;
-                row.foreignAmount = foreignAmount;
-                const QVariant code = line.value(c.currencyCode);
-                row.currencyCode = code.isNull() ? QString() : codes.intern(code.toString());
-                row.balance = balance;
-                row.costCode = codes.intern(NullToText(line.value(c.costCode), space));
-                row.fullMatch = fullMatch;
-                row.currencyId = line.integer(c.currencyId, u"CurrencyID");
-                if (row.currencyId < 1 || row.currencyId > kCurrencyCount)
-                    throw Failure(line.where() + QStringLiteral("מזהה המטבע %1 אינו בתחום 1 עד %2")
-                                                     .arg(row.currencyId)
-                                                     .arg(kCurrencyCount));
-                QString& seenCode = state.CurrencyCodes[static_cast<size_t>(row.currencyId)];
-                const QString& newCode = code.isNull() ? dash : row.currencyCode;
-                if (seenCode != newCode)
-                    seenCode = newCode;
-                row.detail.CompIndex = compId;
-                row.detail.CounterKey = counters.intern(NullToText(counterKey, QString()));
-                row.detail.CounterName = counterName;
-                state.CurrencyTotals[static_cast<size_t>(row.currencyId)] += foreignAmount;
-                ledger.stage(std::move(row));
-                if (ledger.stagedCount() >= commitBatch)
-                    ledger.commitStaged();
-            }
-
-            // A graph-date choice other than the two dates keeps the previous
-            // line's date; the first line then has none to keep.
-            if (options.graphDate == 0)
-                graphDate = valueDate;
-            else if (options.graphDate == 1)
-                graphDate = dueDate;
-            if (!graphDate.isValid())
-                throw Failure(line.where() + QStringLiteral("לא נבחר תאריך לגרף"));
-            state.periods.add(graphDate, amount);
+    // Maps the current line; false for a line without an account key, which
+    // is passed over. The row is filled unless the read is graph-only.
+    bool map(LedgerRow& row) {
+        const QDate valueDate = line_.date(c_.valueDate, u"ValueDate");
+        const QDate dueDate = line_.date(c_.dueDate, u"DueDate");
+        if (line_.required(c_.accountKey, u"AccountKey").toString().isEmpty())
+            return false;
+        ++rowNumber_;
+        // DebitCredit 0 is a debit line, 1 a credit line; any other value
+        // keeps the previous line's sign and counter account.
+        const int debitCredit = line_.side(c_.debitCredit);
+        if (debitCredit == 0 || debitCredit == 1) {
+            const bool debit = debitCredit == 0;
+            counterKey_ = line_.value(debit ? c_.transDebId : c_.transCredId);
+            sign_ = debit ? 1.0 : -1.0;
+            if (options_.incNegdiName)
+                counterName_ =
+                    counters_.intern(NullToText(line_.value(debit ? c_.dName : c_.cName), dash()));
         }
+        const double amount = line_.requiredNumber(c_.suF, u"SuF") * sign_;
+        const double foreignAmount = line_.requiredNumber(c_.suFDlr, u"SuFDlr") * sign_;
+        balance_ += amount;
+        const int fullMatch = line_.integer(c_.fullMatch, u"FullMatch");
+        if (!options_.onlyGraph)
+            fillRow(row, valueDate, dueDate, amount, foreignAmount, fullMatch);
 
-        ++fetched;
-        if (fetched % 5 == 0)
-            progress.setFillWidth(fillWidth(fetched, recCount, frameWidth));
-        rs.MoveNext();
+        // A graph-date choice other than the two dates keeps the previous
+        // line's date; the first line then has none to keep.
+        if (options_.graphDate == 0)
+            graphDate_ = valueDate;
+        else if (options_.graphDate == 1)
+            graphDate_ = dueDate;
+        if (!graphDate_.isValid())
+            throw Failure(line_.where() + QStringLiteral("לא נבחר תאריך לגרף"));
+        totals_.periods.add(graphDate_, amount);
+        return true;
     }
-    ledger.commitStaged();
-    progress.setFillWidth(0);
+
+private:
+    static const QString& dash() {
+        static const QString text = QStringLiteral("-");
+        return text;
+    }
+
+    void fillRow(LedgerRow& row, QDate valueDate, QDate dueDate, double amount,
+                 double foreignAmount, int fullMatch) {
+        static const QString space = QStringLiteral(" ");
+        row.rowNumber = rowNumber_;
+        row.valueDate = valueDate;
+        row.batchNo = line_.required(c_.batchNo, u"BatchNo");
+        row.transId = line_.required(c_.transId, u"TransID");
+        row.dueDate = dueDate;
+        row.referance = line_.numberOrZero(c_.referance, u"Referance");
+        row.ref2 = line_.numberOrZero(c_.ref2, u"Ref2");
+        row.description = NullToText(line_.value(c_.description), space);
+        row.amount = amount;
+        row.foreignAmount = foreignAmount;
+        const QVariant code = line_.value(c_.currencyCode);
+        row.currencyCode = code.isNull() ? QString() : codes_.intern(code.toString());
+        row.balance = balance_;
+        row.costCode = codes_.intern(NullToText(line_.value(c_.costCode), space));
+        row.fullMatch = fullMatch;
+        row.currencyId = line_.integer(c_.currencyId, u"CurrencyID");
+        if (row.currencyId < 1 || row.currencyId > kCurrencyCount)
+            throw Failure(line_.where() + QStringLiteral("מזהה המטבע %1 אינו בתחום 1 עד %2")
+                                              .arg(row.currencyId)
+                                              .arg(kCurrencyCount));
+        const auto id = static_cast<size_t>(row.currencyId);
+        totals_.currencyCodes[id] = code.isNull() ? dash() : row.currencyCode;
+        totals_.currencyTotals[id] += foreignAmount;
+        row.detail.CompIndex = compId_;
+        row.detail.CounterKey = counters_.intern(NullToText(counterKey_, QString()));
+        row.detail.CounterName = counterName_;
+    }
+
+    const Columns c_;
+    const LineReader line_;
+    const JournalOptions options_;
+    const int compId_;
+    JournalTotals totals_;
+    StringPool codes_{256};
+    StringPool counters_{4096};
+    int rowNumber_ = 0;
+    double balance_ = 0.0;
+    double sign_ = 0.0;
+    QVariant counterKey_;
+    QString counterName_;
+    QDate graphDate_;
+};
+
+// The count query's answer: how many lines the main query will give.
+double countLines(Recordset& rs, const JournalRequest& request) {
+    rs.Open(
+        JournalCountSql(request.accountKey, request.options.onlyOpen, request.options.incNegdiName),
+        CursorKind::Dynamic);
+    if (rs.Eof())
+        return 0.0;
+    const QVariant count = rs.value(resolve(rs, QStringLiteral("RecCount")));
     rs.Close();
-    return -1;
+    return count.isNull() ? 0.0 : count.toDouble();
 }
 
 } // namespace
 
-int ReadTransactions7(const QString& CompPath, const QString& pAccountKey, int pCompID,
-                      const JournalOptions& options, LedgerModel& ledger, ProgressSink& progress,
-                      QString* failure) {
-    if (failure)
-        failure->clear();
-    if (accountHidden())
-        return 0;
+void ReadJournal(const JournalRequest& request, JournalSink& sink) {
+    const ConnValues& conn = request.conn;
+    Connection connection;
+    connection.setTimeout(60);
+    connection.open(BuildConnString(conn.ConnServer, conn.ConnUID, conn.ConnPWD, request.compPath,
+                                    conn.ConnType));
+    Recordset rs(connection);
+    const double count = countLines(rs, request);
+    sink.counted(count);
+    if (count == 0.0)
+        return;
+
+    rs.Open(
+        JournalMainSql(request.accountKey, request.options.onlyOpen, request.options.incNegdiName),
+        CursorKind::Dynamic);
+    LineMapper mapper(rs, request);
+    const auto batchSize = static_cast<size_t>(
+        std::max(kMinCommitBatch, static_cast<qsizetype>(count) / kCommitsPerRead));
+    std::vector<LedgerRow> batch;
+    const auto deliver = [&] {
+        sink.delivered(std::move(batch), mapper.totals());
+        batch.clear();
+    };
+    qint64 fetched = 0;
     try {
-        return read(CompPath, pAccountKey, pCompID, options, ledger, progress);
-    } catch (const Failure& error) {
-        // The lines read before the failure stay in the grid with their totals.
-        ledger.commitStaged();
-        if (failure)
-            *failure = error.description();
-        return 0;
+        while (!rs.Eof()) {
+            LedgerRow row;
+            if (mapper.map(row) && !request.options.onlyGraph) {
+                batch.push_back(std::move(row));
+                if (batch.size() >= batchSize)
+                    deliver();
+            }
+            if (++fetched % 5 == 0)
+                sink.progressed(fetched);
+            rs.MoveNext();
+        }
+    } catch (const Failure&) {
+        deliver(); // the lines before the failure stay, with their totals
+        throw;
     }
+    deliver();
+    rs.Close();
 }
 
 } // namespace ardcard

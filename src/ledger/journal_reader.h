@@ -1,10 +1,14 @@
 #pragma once
 
+#include "common/module_state.h"
+#include "common/period_totals.h"
+#include "ledger/ledger_row.h"
+
 #include <QString>
+#include <array>
+#include <vector>
 
 namespace ardcard {
-
-class LedgerModel;
 
 // Options of one company's journal read, as the card's check boxes give them.
 struct JournalOptions {
@@ -14,37 +18,44 @@ struct JournalOptions {
     bool onlyGraph = false;    // lines go into the period totals only, not the grid
 };
 
-// The progress bar the read moves: an outline whose width is read and a fill
-// whose width is set. The card puts its two frames behind this; the read
-// itself knows nothing of widgets.
-class ProgressSink {
-public:
-    virtual ~ProgressSink() = default;
-    virtual int frameWidth() const = 0;
-    virtual void setFillWidth(int width) = 0;
+// The totals a fetch gathers besides its rows: per currency id (1..22) the
+// code seen last ("-" for a Null code) and the signed foreign amounts, and
+// the signed shekel amounts per period for the graph.
+struct JournalTotals {
+    std::array<QString, kCurrencyCount + 1> currencyCodes;
+    std::array<double, kCurrencyCount + 1> currencyTotals{};
+    PeriodTotals periods;
 };
 
-// A progress bar nobody sees.
-class NoProgress final : public ProgressSink {
-public:
-    int frameWidth() const override { return 0; }
-    void setFillWidth(int) override {}
+// Everything one company's read needs, taken by value: the read touches no
+// state of the thread it runs on.
+struct JournalRequest {
+    ConnValues conn; // the company's database is `compPath`, not conn.ConnDataBase
+    QString compPath;
+    QString accountKey; // already cleaned of quotes and commas
+    int compId = 0;     // the company's position in the directory list
+    JournalOptions options;
+    JournalTotals totals; // what earlier companies of the fetch gathered
 };
 
-// Reads one account's journal lines from one company directory (`CompPath`
-// becomes the database of the connection string built from
-// moduleState().conn) and appends a grid row per line to `ledger`, with a
-// running balance that starts at 0 for this call, the row's company position
-// `pCompID` and its counter account. Signed foreign amounts accumulate into
-// moduleState().CurrencyTotals per currency id (1..22) and the signed shekel
-// amounts into moduleState().periods.
-//
-// Returns -1 when the query ran (with or without lines), 0 when the account
-// is hidden in this company (nothing read, `failure` left empty) or the read
-// failed: then `failure` holds a description for the caller to show, and the
-// rows and totals gathered before the failure stay.
-int ReadTransactions7(const QString& CompPath, const QString& pAccountKey, int pCompID,
-                      const JournalOptions& options, LedgerModel& ledger, ProgressSink& progress,
-                      QString* failure = nullptr);
+// Where a read's output goes as it is read.
+class JournalSink {
+public:
+    virtual ~JournalSink() = default;
+    // The count query's answer, before any line is read.
+    virtual void counted(double lines) { (void)lines; }
+    // After every fifth line read.
+    virtual void progressed(qint64 fetched) { (void)fetched; }
+    // Rows in read order (none in a graph-only read) and the totals as they
+    // stand after their lines, the request's own included.
+    virtual void delivered(std::vector<LedgerRow>&& rows, const JournalTotals& totals) = 0;
+};
+
+// Reads the account's journal lines from one company: one grid row per line
+// with a running balance from 0, row numbers from 1, the company position
+// and the counter account; the lines' amounts go into the totals. Lines are
+// delivered in batches. A failure throws Failure, its description naming
+// the line; the lines before it have been delivered.
+void ReadJournal(const JournalRequest& request, JournalSink& sink);
 
 } // namespace ardcard

@@ -22,6 +22,7 @@ public:
     StoredValue(const QVariant& value);
     StoredValue(qlonglong value) : value_(value) {}
     StoredValue(int value) : value_(qlonglong{value}) {}
+    StoredValue(unsigned value) : value_(qlonglong{value}) {}
     StoredValue(double value) : StoredValue(QVariant(value)) {}
     StoredValue(const QString& value) : StoredValue(QVariant(value)) {}
     StoredValue(const StoredValue& other);
