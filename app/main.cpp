@@ -36,8 +36,8 @@ void printError(const QString& text) {
 
 // The demo company lives with the user's data; it is built once.
 QString demoDirectory() {
-    const QString dir = QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation) +
-                        QStringLiteral("/ardcard/demo");
+    QString dir = QStandardPaths::writableLocation(QStandardPaths::GenericDataLocation) +
+                  QStringLiteral("/ardcard/demo");
     const QDir d(dir);
     if (!QFileInfo::exists(d.filePath(demo::DemoFileName())) ||
         !QFileInfo::exists(d.filePath(demo::Demo2FileName()))) {

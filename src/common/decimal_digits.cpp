@@ -72,7 +72,7 @@ void digitsFromText(double magnitude, SignificantDigits& d) {
     const auto res =
         std::to_chars(buf, buf + sizeof buf, magnitude, std::chars_format::scientific, 14);
     const char* const e = static_cast<const char*>(std::memchr(buf, 'e', res.ptr - buf));
-    std::uint64_t digits = static_cast<std::uint64_t>(buf[0] - '0');
+    auto digits = static_cast<std::uint64_t>(buf[0] - '0');
     for (const char* p = buf + 2; p < e; ++p)
         digits = digits * 10 + static_cast<std::uint64_t>(*p - '0');
     int exponent = 0;

@@ -26,7 +26,7 @@ std::size_t grouped(char* out, std::size_t room, double value, int decimals, boo
     char text[24];
     const auto length =
         static_cast<std::size_t>(std::to_chars(text, text + sizeof text, scaled.scaled).ptr - text);
-    const std::size_t places = static_cast<std::size_t>(decimals);
+    const auto places = static_cast<std::size_t>(decimals);
     const std::size_t digits =
         std::max(length + static_cast<std::size_t>(scaled.zeros), places + 1);
     const std::size_t padding = digits - length - static_cast<std::size_t>(scaled.zeros);

@@ -1,5 +1,7 @@
 #include "common/period_totals.h"
 
+#include <algorithm>
+
 namespace ardcard {
 
 void PeriodTotals::clear() {
@@ -14,10 +16,10 @@ int PeriodTotals::weekOfYear(QDate date) {
 
 void PeriodTotals::add(QDate date, double amount) {
     Year& year = years_[date.year()];
-    const int month = date.month();
+    const auto month = static_cast<size_t>(date.month());
     year.weeks[static_cast<size_t>(weekOfYear(date))] += amount;
-    year.months[static_cast<size_t>(month)] += amount;
-    year.quarters[static_cast<size_t>((month - 1) / 3 + 1)] += amount;
+    year.months[month] += amount;
+    year.quarters[(month - 1) / 3 + 1] += amount;
 }
 
 int PeriodTotals::periodsPerYear(int kind) {
@@ -57,16 +59,17 @@ double PeriodTotals::value(int kind, int year, int period) const {
 
 std::vector<int> PeriodTotals::yearsDescending(int kind) const {
     std::vector<int> out;
-    for (auto it = years_.rbegin(); it != years_.rend(); ++it) {
+    for (const auto& [number, year] : years_) {
         int count = 0;
-        const double* values = cells(it->second, kind, &count);
+        const double* values = cells(year, kind, &count);
         for (int period = 1; values && period <= count; ++period) {
             if (values[period] != 0.0) {
-                out.push_back(it->first);
+                out.push_back(number);
                 break;
             }
         }
     }
+    std::reverse(out.begin(), out.end());
     return out;
 }
 

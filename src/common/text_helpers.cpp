@@ -69,18 +69,19 @@ QString PlainNumber(double value) {
     std::string out;
     if (d.negative)
         out += '-';
-    const int len = static_cast<int>(digits.size());
+    const auto len = static_cast<int>(digits.size());
     if (e < 0) {
         out += "0.";
-        out.append(static_cast<size_t>(-e - 1), '0');
+        out.append(static_cast<size_t>(-e) - 1, '0');
         out += digits;
     } else if (e >= len - 1) {
         out += digits;
-        out.append(static_cast<size_t>(e - (len - 1)), '0');
+        out.append(static_cast<size_t>(e) - (digits.size() - 1), '0');
     } else {
-        out.append(digits, 0, static_cast<size_t>(e + 1));
+        const auto point = static_cast<size_t>(e) + 1;
+        out.append(digits, 0, point);
         out += '.';
-        out.append(digits, static_cast<size_t>(e + 1), std::string::npos);
+        out.append(digits, point, std::string::npos);
     }
     return QString::fromLatin1(out.data(), static_cast<qsizetype>(out.size()));
 }

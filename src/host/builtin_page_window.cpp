@@ -31,7 +31,7 @@ namespace {
 // names a scheme (two letters or more, so that a drive letter is not taken
 // for one) is used as an address.
 QUrl pageUrl(const QString& path) {
-    const QUrl url(path);
+    QUrl url(path);
     if (!url.isRelative() && url.scheme().size() > 1)
         return url;
     return QUrl::fromLocalFile(QFileInfo(path).absoluteFilePath());

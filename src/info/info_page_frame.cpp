@@ -69,6 +69,8 @@ void WritePageHead(TextFileWriter& out, const QString& titleLine, const QStringL
     writeLines(out, {u"</HEAD>", u"<BODY TEXT='#000000' LINK='#0000FF' VLINK='#800080'>"});
 }
 
+// The style lines are long: each is written as adjacent literals.
+// NOLINTBEGIN(bugprone-suspicious-missing-comma)
 void WriteWaitPage(const QString& path) {
     WritePageFile(path, [](TextFileWriter& out) {
         writeLines(
@@ -102,6 +104,7 @@ void WriteWaitPage(const QString& path) {
             });
     });
 }
+// NOLINTEND(bugprone-suspicious-missing-comma)
 
 void WriteFrameOpening(TextFileWriter& out) {
     out.writeLine(

@@ -184,7 +184,7 @@ ListSection alternativeItemsSection(const QString& k) {
 
 // Rows come in component-key order; a tree type repeated from the row above
 // is shown as "." so that each change of type stands out.
-ListSection treesSection(const QString& k, std::shared_ptr<int> lastTreeType) {
+ListSection treesSection(const QString& k, const std::shared_ptr<int>& lastTreeType) {
     return {
         QString::fromUtf16(kLayoutRowFirstCell),
         QStringLiteral("SELECT TreeTypes.TreeTypeName, Trees.Quantity, Items.ItemKey"

@@ -108,7 +108,7 @@ QString ReadAllTransactions(const QString& CompPath, const QString& pAccountKey,
     state.CompanyDirCount = SplitCompanyDirs(CompPath, state.CompanyDirList);
     // A text naming no directory leaves the old list in place; the count
     // alone decides what is read.
-    const QString accountKey = StripQuotes(pAccountKey);
+    QString accountKey = StripQuotes(pAccountKey);
     const bool counterNames = sources.includeCounterNames ? sources.includeCounterNames() : false;
 
     for (int i = 1; i <= state.CompanyDirCount; ++i) {
